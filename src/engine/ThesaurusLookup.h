@@ -58,7 +58,8 @@ QString ContextSentence(const ArticleTokens &article, int list, qsizetype row);
 
 /// Looks the word up (stop, navigate to Host + "/search?q=" + word, wait, parse), retries with the
 /// stem when nothing was found, and offers the meanings when not Manual. Empty when nothing found,
-/// StopProcessing is set, or a wait expired.
+/// StopProcessing is set, a wait expired (no stem retry then), or there is no host or page source
+/// (no request is made).
 QString FetchAlternatives(const QString &word, const QString &suffix, int list, qsizetype row,
                           const LookupContext &context);
 

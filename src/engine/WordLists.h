@@ -38,7 +38,7 @@ public:
     const WordRow &Row(int list, qsizetype index) const; ///< index from 0
     const QList<WordRow> &Rows(int list) const;
 
-    /// Appends a row; returns its index (from 0).
+    /// Appends a row; returns its index (from 0). The setters below ignore an index out of range.
     qsizetype Append(int list, const QString &text);
     void SetAlternatives(int list, qsizetype index, const QString &alternatives);
     void SetBlue(int list, qsizetype index, bool blue);
@@ -46,10 +46,15 @@ public:
     void SetChecked(int list, qsizetype index, bool checked);
 
     /// The alternatives of the last row (list 0 rows, then list 1 rows) whose text equals the word
-    /// ignoring case; empty when no row matches.
+    /// ignoring case (compared lowered, as word files are named); empty when no row matches.
+    /// The alternatives are the row's current ones, edits included.
     std::optional<QString> FindRepeat(const QString &word) const;
 
 private:
+    WordRow *MutableRow(int list, qsizetype index);
+    /// Applies a change to an existing row and reports it; a row index out of range is ignored.
+    void Change(int list, qsizetype index, const std::function<void(WordRow &)> &change);
+
     QList<WordRow> m_rows[2];
     QHash<QString, std::pair<int, qsizetype>> m_lastByFoldedText;
 };
