@@ -1,0 +1,2 @@
+INSERT INTO articles (title,body) VALUES ("Spring ""Garden"" Tips & Tricks ","Plant early.
+Water <often> & well ]]> done. ");
