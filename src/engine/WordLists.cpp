@@ -133,9 +133,12 @@ void AddItems(WordLists &lists, const QString &word, int list, const WordTestSet
         } else if (repeat) {
             lists.SetAlternatives(list, index, *repeat);
         } else {
+            // "Manual" as it stood when the lookup began: ticking "Do not prompt again." in the
+            // confirm window must not overwrite the choice that window has just written.
+            const bool manual = hooks.Manual && hooks.Manual();
             const QString found = hooks.Lookup ? hooks.Lookup(word, list, index + 1) : QString();
             // Without "Manual" the confirm window has written the user's choice into the row.
-            if (hooks.Manual && hooks.Manual())
+            if (manual)
                 lists.SetAlternatives(list, index, found);
         }
         if (repeat)

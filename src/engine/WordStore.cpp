@@ -3,6 +3,7 @@
 #include "common/TextFile.h"
 
 #include <QDir>
+#include <QFile>
 #include <QFileInfo>
 
 namespace verbloom {
@@ -54,7 +55,12 @@ bool WordStore::WriteAlternatives(const QString &word, const QString &alternativ
     if (path.isEmpty())
         return false;
     QDir().mkpath(m_dataFolder);
-    return WriteTextFile(path, alternatives);
+    // Rows are saved on every click: leave a file alone when it already holds these bytes.
+    const QByteArray bytes = alternatives.toUtf8();
+    QFile existing(path);
+    if (existing.size() == bytes.size() && existing.open(QIODevice::ReadOnly) && existing.readAll() == bytes)
+        return true;
+    return WriteBinaryFile(path, bytes);
 }
 
 } // namespace verbloom

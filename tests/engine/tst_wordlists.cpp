@@ -9,6 +9,8 @@
 #include <QTemporaryDir>
 #include <QtTest>
 
+#include <sys/stat.h>
+
 using namespace verbloom;
 
 namespace {
@@ -86,6 +88,7 @@ class TestWordLists final : public QObject
 private slots:
     void init() { StopProcessing = false; }
     void cleanup() { StopProcessing = true; }
+    void unchangedWordFileIsLeftAlone();
 
     void wordFileNames_data();
     void wordFileNames();
@@ -254,21 +257,26 @@ void TestWordLists::nonCustomizableTokens()
 void TestWordLists::lookupResultStoredOnlyWhenManual_data()
 {
     QTest::addColumn<bool>("manual");
+    QTest::addColumn<bool>("tickManualDuringLookup");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("manual stores the result") << true << u"last meaning"_qs;
-    QTest::newRow("prompting keeps the confirmed choice") << false << u"chosen"_qs;
+    QTest::newRow("manual stores the result") << true << false << u"last meaning"_qs;
+    QTest::newRow("prompting keeps the confirmed choice") << false << false << u"chosen"_qs;
+    QTest::newRow("do not prompt again keeps the confirmed choice") << false << true << u"chosen"_qs;
 }
 
 void TestWordLists::lookupResultStoredOnlyWhenManual()
 {
     QFETCH(bool, manual);
+    QFETCH(bool, tickManualDuringLookup);
     QFETCH(QString, expected);
     Harness h;
     h.manual = manual;
     h.answers.insert(u"quick"_qs, u"last meaning"_qs);
-    h.onLookup = [&h](const QString &, int list, qsizetype row) {
+    h.onLookup = [&h, tickManualDuringLookup](const QString &, int list, qsizetype row) {
         if (!h.manual) // the confirm window writes into the row it was told
             h.lists.SetAlternatives(list, row - 1, u"chosen"_qs);
+        if (tickManualDuringLookup)
+            h.manual = true;
     };
     h.AddAll({u"A"_qs, u" "_qs}, 1);
     h.Add(u"quick"_qs, 1);
@@ -339,6 +347,25 @@ void TestWordLists::repeatIndexMatchesRowByRowSearch()
         for (const QString &word : words)
             QCOMPARE(lists.FindRepeat(word), SearchRowByRow(lists, word));
     }
+}
+
+void TestWordLists::unchangedWordFileIsLeftAlone()
+{
+    Harness h;
+    QVERIFY(h.store.WriteAlternatives(u"quick"_qs, u"fast, rapid"_qs));
+    const QString path = h.store.GetWordFilePath(u"quick"_qs);
+    const auto inode = [&path] {
+        struct stat info {};
+        ::stat(QFile::encodeName(path).constData(), &info);
+        return info.st_ino;
+    };
+    const auto before = inode();
+    QVERIFY(h.store.WriteAlternatives(u"Quick"_qs, u"fast, rapid"_qs));
+    QCOMPARE(inode(), before);
+    QVERIFY(h.store.WriteAlternatives(u"quick"_qs, u"fast"_qs));
+    QCOMPARE(h.File(u"quick.dat"_qs), u"fast"_qs);
+    QVERIFY(h.store.WriteAlternatives(u"quick"_qs, QString()));
+    QCOMPARE(QFileInfo(path).size(), 0);
 }
 
 QTEST_GUILESS_MAIN(TestWordLists)
