@@ -7,48 +7,6 @@
 
 namespace verbloom {
 
-namespace {
-
-bool IsBlank(const QString &text)
-{
-    return std::all_of(text.begin(), text.end(), [](QChar c) { return c == QLatin1Char(' '); });
-}
-
-} // namespace
-
-std::optional<QString> CheckIgnoredWord(const QString &word, int minimumWordLength)
-{
-    if (word.isEmpty())
-        return u"Please make sure that the ignore word is not empty"_qs;
-    if (word.size() <= minimumWordLength) {
-        return u"Please make sure that the number of letters in ignore word is more than "_qs
-            + QString::number(minimumWordLength);
-    }
-    // The last of these, in this order, that occurs is the one named.
-    std::optional<QChar> found;
-    for (const QChar c : {QLatin1Char(' '), QLatin1Char('.'), QLatin1Char(','), QLatin1Char('\'')}) {
-        if (word.contains(c))
-            found = c;
-    }
-    if (found)
-        return u"Please make sure that the letter \""_qs + *found + u"\" is NOT there in your word"_qs;
-    return std::nullopt;
-}
-
-std::optional<QString> VerifyArticle(const QString &title, const QString &contents)
-{
-    if (IsBlank(title))
-        return u"The title cannot be blank."_qs;
-    if (IsBlank(contents))
-        return u"The contents cannot be blank."_qs;
-    return std::nullopt;
-}
-
-QString WithClosingBlank(const QString &text)
-{
-    return text.endsWith(QLatin1Char(' ')) ? text : text + QLatin1Char(' ');
-}
-
 BatchAnalysis::BatchAnalysis(const WordTestSettings &settings, const WordStore &store,
                              const LookupContext &lookup, BatchConsole &console)
     : m_settings(settings)

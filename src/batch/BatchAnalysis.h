@@ -2,6 +2,7 @@
 
 #include "engine/ThesaurusLookup.h"
 #include "engine/WordLists.h"
+#include "shell/ArticleChecks.h"
 #include "shell/ArticleModel.h"
 
 #include <QString>
@@ -13,16 +14,6 @@ namespace verbloom {
 
 class BatchConsole;
 class WordStore;
-
-/// The refusal of "Add to list" for an ignored word, or nothing when it may be added.
-std::optional<QString> CheckIgnoredWord(const QString &word, int minimumWordLength);
-
-/// The check of "Next": "The title cannot be blank." or "The contents cannot be blank." (only the
-/// blank, code 32, counts as blank), or nothing.
-std::optional<QString> VerifyArticle(const QString &title, const QString &contents);
-
-/// The text with one blank appended when it does not end with one, as "Next" leaves the boxes.
-QString WithClosingBlank(const QString &text);
 
 /// The analysis of "Next" without windows: splits the article and adds one word row per token
 /// with the word-file, earlier-row and lookup rules (lookups as with "Manual" checked).

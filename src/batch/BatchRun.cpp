@@ -1,4 +1,5 @@
 #include "batch/BatchRun.h"
+#include "common/LineEnds.h"
 
 #include "batch/BatchActions.h"
 #include "batch/BatchAnalysis.h"
@@ -56,8 +57,8 @@ int RunBatch(const BatchArguments &arguments, BatchConsole &console)
         }
         settings.IgnoredWords.append(word.trimmed());
     }
-    if (const std::optional<QString> refusal = VerifyArticle(arguments.Title, contents)) {
-        console.Error(*refusal);
+    if (const std::optional<ArticleRefusal> refusal = VerifyArticleTexts(arguments.Title, contents)) {
+        console.Error(refusal->Message);
         return kExitFailed;
     }
     BatchActions actions(arguments, programFolder, DecimalPoint(), console);
@@ -79,7 +80,8 @@ int RunBatch(const BatchArguments &arguments, BatchConsole &console)
     }
 
     // "Next": the closing blanks, then the analysis.
-    const ArticleBoxes article{WithClosingBlank(arguments.Title), WithClosingBlank(contents)};
+    // The contents box of the window holds CR LF line breaks; so does the first version.
+    const ArticleBoxes article{WithClosingBlank(arguments.Title), WithClosingBlank(NormalizeToCrLf(contents))};
     const WordStore store(programFolder);
     BatchAnalysis analysis(settings, store, lookup, console);
     analysis.Run(article.Title, article.Contents);

@@ -1,4 +1,5 @@
 #include "SpinGenerator.h"
+#include "common/LineEnds.h"
 
 #include "common/Numbers.h"
 #include "engine/AlternativesList.h"
@@ -111,11 +112,6 @@ QString SpinTokens(const QStringList &tokens, qsizetype count, const SpinSetting
     return result;
 }
 
-QString WithCrLf(QString text)
-{
-    return text.replace(QLatin1Char('\n'), QLatin1String("\r\n"));
-}
-
 } // namespace
 
 WordFileAlternatives::WordFileAlternatives(const WordStore &store)
@@ -165,7 +161,7 @@ QString SpinTitle(const QStringList &titleTokens, const SpinSettings &settings,
 QString SpinContents(const QStringList &contentsTokens, const SpinSettings &settings,
                      AlternativesSource &source, RandomSource &random)
 {
-    return WithCrLf(SpinTokens(contentsTokens, contentsTokens.size(), settings, source, random));
+    return LfToCrLf(SpinTokens(contentsTokens, contentsTokens.size(), settings, source, random));
 }
 
 Spinner::Spinner(const ArticleTokens &article, const SpinSettings &settings,
@@ -249,7 +245,7 @@ struct SegmentDraft
 Spinner::SpinPlan Spinner::Plan(const QStringList &tokens, qsizetype count, bool crLf)
 {
     const bool fixed = m_source.KeepsTextsForRun();
-    const auto output = [crLf](const QString &text) { return crLf ? WithCrLf(text) : text; };
+    const auto output = [crLf](const QString &text) { return crLf ? LfToCrLf(text) : text; };
 
     QList<SegmentDraft> drafts(1); // leading unchanged tokens
     for (qsizetype i = 0; i < count; ++i) {
@@ -322,7 +318,7 @@ QString Spinner::Spin(const SpinPlan &plan, qsizetype &sizeHint, Random &random)
             const QString &token = plan.Source.at(segment.ReadAtSpin);
             const QString text =
                 ReplaceCustomizable(token, m_source.Alternatives(token), divisor, random);
-            writer.Append(plan.CrLf ? WithCrLf(text) : text);
+            writer.Append(plan.CrLf ? LfToCrLf(text) : text);
             continue;
         }
         writer.AppendPadded(pool + segment.Output.Offset, segment.Output.Length);

@@ -1,4 +1,5 @@
 #include "WebEngineBrowser.h"
+#include "common/LineEnds.h"
 
 #include <QCoreApplication>
 #include <QDir>
@@ -28,14 +29,6 @@ QWebEngineProfile *SharedProfile()
     // outlives every page.
     static QWebEngineProfile *profile = new QWebEngineProfile(QCoreApplication::instance());
     return profile;
-}
-
-QString ToCrLf(QString text)
-{
-    text.replace(u"\r\n"_qs, u"\n"_qs);
-    text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
-    text.replace(u"\n"_qs, u"\r\n"_qs);
-    return text;
 }
 
 QUrl AddressToUrl(const QString &address)
@@ -189,8 +182,8 @@ void WebEngineBrowser::OnTextsCollected(quint64 generation, const QVariant &resu
     if (generation != m_generation || m_readyState != 1 || m_page->isLoading())
         return;
     const QVariantMap texts = result.toMap();
-    m_rootText = ToCrLf(texts.value(u"root"_qs).toString());
-    m_bodyText = ToCrLf(texts.value(u"body"_qs).toString());
+    m_rootText = NormalizeToCrLf(texts.value(u"root"_qs).toString());
+    m_bodyText = NormalizeToCrLf(texts.value(u"body"_qs).toString());
     m_hasBody = texts.value(u"hasBody"_qs).toBool();
     m_title = texts.value(u"title"_qs).toString();
     m_readyState = ReadyStateComplete;

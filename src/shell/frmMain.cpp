@@ -1,4 +1,5 @@
 #include "frmMain.h"
+#include "common/LineEnds.h"
 
 #include "BrowserPageSource.h"
 #include "ImageCommand.h"
@@ -14,6 +15,7 @@
 #include "engine/SpinGenerator.h"
 #include "engine/WordStore.h"
 #include "engine/frmSuggestions.h"
+#include "shell/ArticleChecks.h"
 #include "shell/ArticleModel.h"
 
 #include <QCloseEvent>
@@ -68,13 +70,6 @@ QString BannerHtml()
            ".t span{color:#ffb347}.s{font-size:14px;opacity:.85;margin-top:6px}"
            "</style></head><body><div class='b'><div class='t'>Verb<span>loom</span></div>"
            "<div class='s'>Write one article, publish many unique versions.</div></div></body></html>"_qs;
-}
-
-// Line breaks of a plain text box as the files of the program write them.
-QString WithCrLf(QString text)
-{
-    text.replace(QLatin1Char('\n'), CrLf);
-    return text;
 }
 
 } // namespace
@@ -482,24 +477,15 @@ void frmMain::cmdConfig_Click()
 
 bool frmMain::VerifyArticle()
 {
-    const auto isBlank = [](const QString &text) {
-        for (QChar c : text) {
-            if (c != QLatin1Char(' '))
-                return false;
-        }
+    const std::optional<ArticleRefusal> refusal = VerifyArticleTexts(txtTitle->text(), txtArticle->toPlainText());
+    if (!refusal)
         return true;
-    };
-    if (isBlank(txtTitle->text())) {
-        m_ui.Say(this, u"The title cannot be blank."_qs);
+    m_ui.Say(this, refusal->Message);
+    if (refusal->Field == ArticleField::Title)
         txtTitle->setFocus();
-        return false;
-    }
-    if (isBlank(txtArticle->toPlainText())) {
-        m_ui.Say(this, u"The contents cannot be blank."_qs);
+    else
         txtArticle->setFocus();
-        return false;
-    }
-    return true;
+    return false;
 }
 
 void frmMain::AppendBlankIfMissing(QLineEdit *box)
@@ -649,7 +635,7 @@ void frmMain::cmdSave_Click()
     const QString path = m_ui.GetSaveFileName(this, dialog);
     if (path.isEmpty())
         return;
-    const QString text = txtVerifyTitle->text() + CrLf + CrLf + WithCrLf(txtVerifyContents->toPlainText());
+    const QString text = txtVerifyTitle->text() + CrLf + CrLf + NormalizeToCrLf(txtVerifyContents->toPlainText());
     if (!WriteTextFile(path, text)) {
         m_ui.Say(this, u"The file could not be saved as "_qs + path + CrLf
                      + u"Please choose another name or folder."_qs,
@@ -694,22 +680,8 @@ void frmMain::cmdIgnoreWordsAdd_Click()
 {
     const QString word = txtIgnoreWord->text();
     const int minimumLength = cmbIgnoreWords->currentIndex() + 2;
-    if (word.isEmpty()) {
-        m_ui.Say(this, u"Please make sure that the ignore word is not empty"_qs);
-        return;
-    }
-    if (word.size() <= minimumLength) {
-        m_ui.Say(this, u"Please make sure that the number of letters in ignore word is more than "_qs
-                           + QString::number(minimumLength));
-        return;
-    }
-    QChar refused;
-    for (QChar c : {QLatin1Char(' '), QLatin1Char('.'), QLatin1Char(','), QLatin1Char('\'')}) {
-        if (word.contains(c))
-            refused = c;
-    }
-    if (!refused.isNull()) {
-        m_ui.Say(this, u"Please make sure that the letter \""_qs + refused + u"\" is NOT there in your word"_qs);
+    if (const std::optional<QString> refusal = CheckIgnoredWord(word, minimumLength)) {
+        m_ui.Say(this, *refusal);
         return;
     }
     auto *item = new QTreeWidgetItem(lstIgnoreWords);

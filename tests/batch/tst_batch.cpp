@@ -102,6 +102,7 @@ private slots:
     void matchesSiteGoldenFiles();
     void writesTextLayout_data();
     void writesTextLayout();
+    void firstStatementHasCrLfLineBreaks();
 
     void repeatsTheSequenceWithoutSeed_data();
     void repeatsTheSequenceWithoutSeed();
@@ -338,6 +339,16 @@ void TestBatch::writesTextLayout()
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(ReadBytes(output), expected);
+}
+
+void TestBatch::firstStatementHasCrLfLineBreaks()
+{
+    const QString output = m_out + u"/lines.sql"_qs;
+    const BatchRun run = Run(Article(u"T"_qs, u"a\nb\rc"_qs)
+                             + QStringList{u"--sql"_qs, output, u"--table"_qs, u"t"_qs, u"--title-field"_qs,
+                                           u"x"_qs, u"--article-field"_qs, u"y"_qs, u"--count"_qs, u"1"_qs});
+    QCOMPARE(run.ExitCode, 0);
+    QCOMPARE(ReadBytes(output), QByteArray("INSERT INTO t (x,y) VALUES (\"T \",\"a\r\nb\r\nc \");\r\n"));
 }
 
 // ---------------------------------------------------------------------------------------------

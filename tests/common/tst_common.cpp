@@ -1,4 +1,5 @@
 #include "common/IniFile.h"
+#include "common/LineEnds.h"
 #include "common/Numbers.h"
 #include "common/ProgramFolder.h"
 #include "common/TextFile.h"
@@ -33,6 +34,8 @@ private slots:
     void iniValues_data();
     void iniValues();
     void homeArgument();
+    void lineEnds_data();
+    void lineEnds();
 };
 
 void TestCommon::roundsHalvesToEven_data()
@@ -234,6 +237,27 @@ void TestCommon::homeArgument()
     QTemporaryDir dir;
     SetProgramFolder(dir.path() + u"/"_qs);
     QCOMPARE(ProgramPath(u"data"_qs), QDir::cleanPath(dir.path()) + u"/data"_qs);
+}
+
+void TestCommon::lineEnds_data()
+{
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("lfToCrLf");
+    QTest::addColumn<QString>("normalized");
+    QTest::newRow("none") << u"abc"_qs << u"abc"_qs << u"abc"_qs;
+    QTest::newRow("lf") << u"a\nb\n"_qs << u"a\r\nb\r\n"_qs << u"a\r\nb\r\n"_qs;
+    QTest::newRow("crlf stays one break") << u"a\r\nb"_qs << u"a\r\r\nb"_qs << u"a\r\nb"_qs;
+    QTest::newRow("lone cr") << u"a\rb"_qs << u"a\rb"_qs << u"a\r\nb"_qs;
+    QTest::newRow("lf cr is two breaks") << u"a\n\rb"_qs << u"a\r\n\rb"_qs << u"a\r\n\r\nb"_qs;
+}
+
+void TestCommon::lineEnds()
+{
+    QFETCH(QString, text);
+    QFETCH(QString, lfToCrLf);
+    QFETCH(QString, normalized);
+    QCOMPARE(LfToCrLf(text), lfToCrLf);
+    QCOMPARE(NormalizeToCrLf(text), normalized);
 }
 
 QTEST_GUILESS_MAIN(TestCommon)
