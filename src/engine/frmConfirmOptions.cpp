@@ -4,6 +4,8 @@
 #include "engine/frmSuggestions.h"
 #include "shell/ImageCommand.h"
 
+#include <algorithm>
+
 #include <QCheckBox>
 #include <QEvent>
 #include <QHBoxLayout>
@@ -153,7 +155,14 @@ QString frmConfirmOptions::SelectedAlternatives() const
         const QTreeWidgetItem *item = lstSuggestionsFromWeb->topLevelItem(i);
         if (item->checkState(0) != Qt::Checked)
             continue;
-        const QString meaning = item->text(0) + QStringLiteral(", ") + TrimSpaces(item->text(1));
+        const QString entryWord = item->text(0);
+        const QString synonyms = TrimSpaces(item->text(1));
+        // The entry word goes in front of its synonyms, unless it already is one of them.
+        const QStringList pieces = SplitAlternatives(synonyms);
+        const bool listed = std::any_of(pieces.cbegin(), pieces.cend(), [&entryWord](const QString &piece) {
+            return TrimSpaces(piece).compare(entryWord, Qt::CaseInsensitive) == 0;
+        });
+        const QString meaning = listed ? synonyms : entryWord + QStringLiteral(", ") + synonyms;
         result = result.isEmpty() ? meaning : result + QStringLiteral(", ") + meaning;
     }
     return result;

@@ -13,6 +13,9 @@ using namespace verbloom::test;
 namespace {
 
 const QString kTwoMeanings = MeaningsPage({{u"glad"_qs, u" happy, joyful "_qs}, {u"merry"_qs, u"jolly"_qs}});
+// A meaning whose entry word stands among its own synonyms.
+const QString kThreeMeanings = MeaningsPage(
+    {{u"glad"_qs, u" happy, joyful "_qs}, {u"merry"_qs, u"jolly"_qs}, {u"bright"_qs, u"sunny, Bright"_qs}});
 
 QTreeWidget *Meanings(frmConfirmOptions &window)
 {
@@ -35,8 +38,8 @@ struct ConfirmRig : SuggestionsRig
 {
     ConfirmRig() : SuggestionsRig({{u"glad"_qs, u"old, stuff"_qs}})
     {
-        Host.Page.Pages.insert(SearchUrl(u"Glad"_qs), kTwoMeanings);
-        Host.Page.Pages.insert(SearchUrl(u"glad"_qs), kTwoMeanings);
+        Host.Page.Pages.insert(SearchUrl(u"Glad"_qs), kThreeMeanings);
+        Host.Page.Pages.insert(SearchUrl(u"glad"_qs), kThreeMeanings);
     }
 
     /// Analyses "Glad " / "so glad " and presses "Get Suggenstion" on a "glad" row; `act` answers
@@ -123,6 +126,8 @@ void tst_frmConfirmOptions::saveSelectedComposesChoice_data()
     QTest::newRow("nothing clears the row") << 1 << QList<int>{} << QString() << u"lblSuggestionOk"_qs << QString();
     QTest::newRow("title row") << 0 << QList<int>{0} << QString() << u"lblSuggestionOk"_qs
                                << u"glad, happy, joyful"_qs;
+    QTest::newRow("entry word already a synonym is not repeated")
+        << 1 << QList<int>{1, 2} << QString() << u"cmdSuggestionOk"_qs << u"merry, jolly, sunny, Bright"_qs;
 }
 
 void tst_frmConfirmOptions::saveSelectedComposesChoice()
