@@ -1,5 +1,7 @@
 #include "bench_export.h"
 
+#include "BenchVocabulary.h"
+
 #include "common/TextFile.h"
 #include "engine/RandomSource.h"
 #include "engine/SpinGenerator.h"
@@ -47,28 +49,12 @@ bool ResetPeak()
     return clearRefs.open(QIODevice::WriteOnly) && clearRefs.write("5") == 1;
 }
 
-QString Word(QRandomGenerator &random)
-{
-    static const char *const kSyllables[] = {"ta", "mel", "ro", "vin", "cas", "por", "li", "den",
-                                            "que", "sor", "na", "bel", "tum", "gar", "fe", "lo"};
-    QString word;
-    for (int i = 0, n = 2 + random.bounded(3); i < n; ++i)
-        word += QLatin1String(kSyllables[random.bounded(int(std::size(kSyllables)))]);
-    return word;
-}
-
 // A 1,000-word article whose every word has a word file of three alternatives.
 ArticleBoxes MakeArticle(const WordStore &store)
 {
     QRandomGenerator random(7);
-    QStringList vocabulary;
-    while (vocabulary.size() < kVocabulary) {
-        const QString word = Word(random);
-        if (!vocabulary.contains(word)) {
-            vocabulary.append(word);
-            store.WriteAlternatives(word, Word(random) + u", "_qs + Word(random) + u", "_qs + Word(random));
-        }
-    }
+    const QStringList vocabulary = MakeVocabulary(random, kVocabulary);
+    WriteWordFiles(store, vocabulary, random, 3, 3, false);
     ArticleBoxes article;
     for (int i = 0; i < 8; ++i)
         article.Title += vocabulary.at(random.bounded(kVocabulary)) + u' ';

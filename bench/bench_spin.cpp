@@ -1,5 +1,7 @@
 #include "bench_spin.h"
 
+#include "BenchVocabulary.h"
+
 #include "engine/RandomSource.h"
 #include "engine/SpinGenerator.h"
 #include "engine/WordStore.h"
@@ -21,17 +23,6 @@ constexpr int kArticleWords = 1000;
 constexpr int kVocabulary = 400;
 
 // A made-up word of 2 to 4 syllables: at least 4 letters, so every one is customizable.
-QString MakeWord(QRandomGenerator &random)
-{
-    static const char *const kSyllables[] = {"ba", "ker", "lo", "mint", "sa", "tor", "vi", "den",
-                                            "qua", "rel", "po", "shen", "tu", "mar", "gle", "fi"};
-    QString word;
-    const int syllables = 2 + random.bounded(3);
-    for (int i = 0; i < syllables; ++i)
-        word += QLatin1String(kSyllables[random.bounded(int(std::size(kSyllables)))]);
-    return word;
-}
-
 struct BenchArticle
 {
     ArticleTokens Tokens;
@@ -43,20 +34,8 @@ struct BenchArticle
 BenchArticle MakeArticle(const WordStore &store, const WordTestSettings &wordTest)
 {
     QRandomGenerator random(2024);
-    QStringList vocabulary;
-    while (vocabulary.size() < kVocabulary) {
-        const QString word = MakeWord(random);
-        if (!vocabulary.contains(word))
-            vocabulary.append(word);
-    }
-    for (const QString &word : vocabulary) {
-        QStringList alternatives;
-        const int count = 2 + random.bounded(4);
-        for (int i = 0; i < count; ++i)
-            alternatives.append(random.bounded(5) == 0 ? MakeWord(random) + u' ' + MakeWord(random)
-                                                       : MakeWord(random));
-        store.WriteAlternatives(word, alternatives.join(QLatin1String(", ")));
-    }
+    const QStringList vocabulary = bench::MakeVocabulary(random, kVocabulary);
+    bench::WriteWordFiles(store, vocabulary, random, 2, 5, true);
 
     QString title;
     for (int i = 0; i < 8; ++i)
