@@ -17,12 +17,7 @@ class ScriptedRandomSource final : public RandomSource
 {
 public:
     explicit ScriptedRandomSource(QList<double> draws = {}) : m_draws(std::move(draws)) {}
-    double NextUniform() override
-    {
-        const double u = m_taken < m_draws.size() ? m_draws.at(m_taken) : 0.0;
-        ++m_taken;
-        return u;
-    }
+    double NextUniform() override { return m_draws.value(m_taken++, 0.0); }
     qsizetype Taken() const { return m_taken; }
 
 private:

@@ -13,12 +13,12 @@ namespace {
 
 const QString kHost = u"http://127.0.0.1:8080"_qs;
 
-// "entry|synonyms" per meaning, for compact expectations.
+// "entry=synonyms" per meaning, for compact expectations.
 QStringList Flatten(const QList<MeaningEntry> &meanings)
 {
     QStringList flat;
     for (const MeaningEntry &meaning : meanings)
-        flat.append(meaning.EntryWord + u'|' + meaning.Synonyms);
+        flat.append(meaning.EntryWord + u'=' + meaning.Synonyms);
     return flat;
 }
 
@@ -28,18 +28,8 @@ QString Meaning(const QString &entry, const QString &synonyms)
                       u"Definition: something"_qs, u"Synonyms: "_qs + synonyms});
 }
 
-const QString kQuickPage = PageLines({u"quick - Thesaurus"_qs,
-                                      Meaning(u"quick"_qs, u"fast, rapid, speedy"_qs),
-                                      Meaning(u"quick 2"_qs, u"core, heart "_qs),
-                                      u"Antonyms: slow"_qs});
-
-QStringList Tokens(const QString &prefix, int count)
-{
-    QStringList tokens;
-    for (int i = 0; i < count; ++i)
-        tokens.append(prefix + QString::number(i));
-    return tokens;
-}
+const QString kQuickPage = PageLines({u"quick - Thesaurus"_qs, Meaning(u"quick"_qs, u"fast, rapid, speedy"_qs),
+                                      Meaning(u"quick 2"_qs, u"core, heart "_qs), u"Antonyms: slow"_qs});
 
 } // namespace
 
@@ -55,70 +45,52 @@ private slots:
     void parsesPage();
     void contextSentence_data();
     void contextSentence();
-    void manualTakesLastMeaning();
-    void offersMeanings();
-    void retriesWithStem_data();
-    void retriesWithStem();
-    void stopFlagRequestsNothing();
-    void stopDuringWaitSkipsOfferAndRetry();
-    void expiredWaitGivesNothing();
-    void noHostNoRequest();
+    void lookup_data();
+    void lookup();
 };
 
 void TestThesaurus::parsesPage_data()
 {
     QTest::addColumn<QString>("page");
     QTest::addColumn<QString>("suffix");
-    QTest::addColumn<QStringList>("meanings");
+    QTest::addColumn<QString>("meanings"); // "entry=synonyms", "|" between
     QTest::addColumn<QString>("last");
 
-    QTest::newRow("two meanings") << kQuickPage << QString()
-                                  << QStringList{u"quick| fast, rapid, speedy"_qs, u"quick| core, heart "_qs}
-                                  << u"core, heart"_qs;
-    QTest::newRow("synonyms at distance two")
-        << PageLines({u"Main Entry: quick"_qs, u"x"_qs, u"Synonyms: fast"_qs, u"y"_qs, u"z"_qs})
-        << QString() << QStringList() << QString();
-    QTest::newRow("synonyms at distance four")
-        << PageLines({u"Main Entry: quick"_qs, u"x"_qs, u"y"_qs, u"z"_qs, u"Synonyms: fast"_qs})
-        << QString() << QStringList() << QString();
+    QTest::newRow("two meanings")
+        << kQuickPage << QString() << u"quick= fast, rapid, speedy|quick= core, heart "_qs << u"core, heart"_qs;
+    QTest::newRow("synonyms at distance two and four")
+        << PageLines({u"Main Entry: quick"_qs, u"x"_qs, u"Synonyms: fast"_qs, u"y"_qs, u"Synonyms: slow"_qs})
+        << QString() << QString() << QString();
     QTest::newRow("second colon cuts") << Meaning(u"quick"_qs, u"fast: rapid, speedy"_qs) << QString()
-                                       << QStringList{u"quick| fast"_qs} << u"fast"_qs;
-    QTest::newRow("entry second field") << Meaning(u"run: verb"_qs, u"dash"_qs) << QString()
-                                        << QStringList{u"run| dash"_qs} << u"dash"_qs;
-    QTest::newRow("homograph number") << Meaning(u"bank 2"_qs, u"shore"_qs) << QString()
-                                      << QStringList{u"bank| shore"_qs} << u"shore"_qs;
-    QTest::newRow("two words stay") << Meaning(u"ice cream"_qs, u"sorbet"_qs) << QString()
-                                    << QStringList{u"ice cream| sorbet"_qs} << u"sorbet"_qs;
+                                       << u"quick= fast"_qs << u"fast"_qs;
+    // The homograph number goes, a second word stays, a second ": " ends the entry word.
+    QTest::newRow("entry words")
+        << PageLines({Meaning(u"bank 2"_qs, u"shore"_qs), Meaning(u"ice cream"_qs, u"sorbet"_qs),
+                      Meaning(u"run: verb"_qs, QString())})
+        << QString() << u"bank= shore|ice cream= sorbet|run= "_qs << QString();
     QTest::newRow("entry in last three lines")
         << PageLines({u"Synonyms: x"_qs, u"Main Entry: quick"_qs, u"a"_qs, u"Synonyms: fast"_qs})
-        << QString() << QStringList() << QString();
-    QTest::newRow("entry last line") << u"Main Entry: quick"_qs << QString() << QStringList()
-                                     << QString();
-    QTest::newRow("no colon blank after label")
-        << PageLines({u"Main Entry:quick"_qs, u"a"_qs, u"b"_qs, u"Synonyms: fast"_qs})
-        << QString() << QStringList() << QString();
-    QTest::newRow("labels are case exact")
-        << PageLines({u"main entry: quick"_qs, u"a"_qs, u"b"_qs, u"Synonyms: fast"_qs,
-                      u"Main Entry: quick"_qs, u"a"_qs, u"b"_qs, u"synonyms: fast"_qs})
-        << QString() << QStringList() << QString();
-    QTest::newRow("empty synonyms still a meaning") << Meaning(u"quick"_qs, QString()) << QString()
-                                                    << QStringList{u"quick| "_qs} << QString();
+        << QString() << QString() << QString();
+    QTest::newRow("labels case exact, blank after the entry label")
+        << PageLines({u"main entry: quick"_qs, u"a"_qs, u"b"_qs, u"Synonyms: fast"_qs, u"Main Entry: quick"_qs,
+                      u"a"_qs, u"b"_qs, u"synonyms: fast"_qs, u"Main Entry:quick"_qs, u"a"_qs, u"b"_qs,
+                      u"Synonyms: fast"_qs})
+        << QString() << QString() << QString();
     QTest::newRow("only LF breaks are one line")
-        << u"Main Entry: quick\nx\ny\nSynonyms: fast"_qs << QString() << QStringList() << QString();
-    QTest::newRow("suffix inflects entry and synonyms")
-        << Meaning(u"walk"_qs, u"stroll, go on foot, March"_qs) << u"ed"_qs
-        << QStringList{u"walked|strolled, marched"_qs} << u"stroll, go on foot, March"_qs;
-    QTest::newRow("empty page") << QString() << QString() << QStringList() << QString();
+        << u"Main Entry: quick\nx\ny\nSynonyms: fast"_qs << QString() << QString() << QString();
+    QTest::newRow("suffix inflects the meanings, not the result")
+        << Meaning(u"walk"_qs, u"stroll, go on foot, March"_qs) << u"ed"_qs << u"walked=strolled, marched"_qs
+        << u"stroll, go on foot, March"_qs;
 }
 
 void TestThesaurus::parsesPage()
 {
     QFETCH(QString, page);
     QFETCH(QString, suffix);
-    QFETCH(QStringList, meanings);
+    QFETCH(QString, meanings);
     QFETCH(QString, last);
     const ParsedPage parsed = ParseThesaurusPage(page, suffix);
-    QCOMPARE(Flatten(parsed.Meanings), meanings);
+    QCOMPARE(Flatten(parsed.Meanings).join(u'|'), meanings);
     QCOMPARE(parsed.LastSynonyms, last);
 }
 
@@ -126,151 +98,108 @@ void TestThesaurus::contextSentence_data()
 {
     QTest::addColumn<int>("list");
     QTest::addColumn<int>("row");
-    QTest::addColumn<QString>("expected");
-    const QStringList title = Tokens(u"t"_qs, 50);
-    const QStringList contents = Tokens(u"c"_qs, 45);
-    QTest::newRow("title row 5 starts at token 1") << 0 << 5 << title.mid(1, 41).join(QString());
-    QTest::newRow("title row 20") << 0 << 20 << title.mid(1, 41).join(QString());
-    QTest::newRow("title row 21 starts at token 1") << 0 << 21 << title.mid(1, 41).join(QString());
-    QTest::newRow("title row 22 starts at token 2") << 0 << 22 << title.mid(2, 41).join(QString());
-    QTest::newRow("contents row 30 stops at the end") << 1 << 30 << contents.mid(10).join(QString());
-    QTest::newRow("other list reads the title") << 7 << 5 << title.mid(1, 41).join(QString());
-    QTest::newRow("row past the end") << 1 << 100 << QString();
+    QTest::addColumn<int>("from");
+    QTest::addColumn<int>("to"); // last token index; -1: empty
+    QTest::newRow("title row 5 starts at token 1") << 0 << 5 << 1 << 41;
+    QTest::newRow("title row 21 starts at token 1") << 0 << 21 << 1 << 41;
+    QTest::newRow("title row 22 starts at token 2") << 0 << 22 << 2 << 42;
+    QTest::newRow("contents row 30 stops at the end") << 1 << 30 << 10 << 44;
+    QTest::newRow("other list reads the title") << 7 << 5 << 1 << 41;
+    QTest::newRow("row past the end") << 1 << 100 << 0 << -1;
 }
 
 void TestThesaurus::contextSentence()
 {
     QFETCH(int, list);
     QFETCH(int, row);
-    QFETCH(QString, expected);
+    QFETCH(int, from);
+    QFETCH(int, to);
     ArticleTokens article;
-    article.TitleTokens = Tokens(u"t"_qs, 50);
-    article.ContentsTokens = Tokens(u"c"_qs, 45);
+    QString expected;
+    for (int i = 0; i < 50; ++i) {
+        article.TitleTokens.append(u't' + QString::number(i));
+        if (i < 45)
+            article.ContentsTokens.append(u'c' + QString::number(i));
+        if (i >= from && i <= to)
+            expected += (list == 1 ? u'c' : u't') + QString::number(i);
+    }
     QCOMPARE(ContextSentence(article, list, row), expected);
 }
 
-void TestThesaurus::manualTakesLastMeaning()
+void TestThesaurus::lookup_data()
 {
+    QTest::addColumn<QString>("word");
+    QTest::addColumn<bool>("manual");
+    QTest::addColumn<int>("list");
+    QTest::addColumn<int>("row");
+    QTest::addColumn<QString>("disturbance"); // "stop", "no host", "expire" or "stop in wait"
+    QTest::addColumn<QString>("expected");
+    QTest::addColumn<QString>("requests");    // the words requested, "|" between
+    QTest::addColumn<QString>("offer");       // what the confirm window shows, "|" between; "": none
+
+    QTest::newRow("manual takes the last meaning")
+        << u"Quick"_qs << true << 0 << 1 << QString() << u"core, heart"_qs << u"Quick"_qs << QString();
+    // Row 5 of the title: the context runs from token index 1 to the end of the title.
+    QTest::newRow("offer") << u"quick"_qs << false << 0 << 5 << QString() << u"core, heart"_qs << u"quick"_qs
+                           << u"quick||Suggest the word closest in meaning to \"quick\"|quick: confirm suggestions"
+                              "| very quick brown fox jumps |0|5|quick=fast, rapid, speedy|quick=core, heart"_qs;
+    // A word with no meaning is retried with its stem; the result gets the suffix back.
+    QTest::newRow("manual stem retry") << u"Walked"_qs << true << 1 << 3 << QString() << u"strolled, marched"_qs
+                                       << u"Walked|Walk"_qs << QString();
+    QTest::newRow("stem retry offer")
+        << u"Walked"_qs << false << 1 << 3 << QString() << u"strolled, marched"_qs << u"Walked|Walk"_qs
+        << u"Walk|ed|Suggest the word closest in meaning to \"Walked\"|Walk: confirm suggestions| Walked home. "
+           "|1|3|walked=strolled, marched"_qs;
+    QTest::newRow("stop flag") << u"quick"_qs << true << 0 << 1 << u"stop"_qs << QString() << QString()
+                               << QString();
+    QTest::newRow("no host") << u"quick"_qs << false << 0 << 1 << u"no host"_qs << QString() << QString()
+                             << QString();
+    QTest::newRow("expired wait")
+        << u"quick"_qs << false << 0 << 1 << u"expire"_qs << QString() << u"quick"_qs << QString();
+    // Cancel during the wait: the loaded page is still read, but nothing is offered or retried.
+    QTest::newRow("stop in wait")
+        << u"quick"_qs << false << 0 << 1 << u"stop in wait"_qs << u"core, heart"_qs << u"quick"_qs << QString();
+    QTest::newRow("stop in wait, no retry")
+        << u"Walked"_qs << true << 1 << 3 << u"stop in wait"_qs << QString() << u"Walked"_qs << QString();
+}
+
+void TestThesaurus::lookup()
+{
+    QFETCH(QString, word);
+    QFETCH(bool, manual);
+    QFETCH(int, list);
+    QFETCH(int, row);
+    QFETCH(QString, disturbance);
+    QFETCH(QString, expected);
+    QFETCH(QString, requests);
+    QFETCH(QString, offer);
+
+    const ArticleTokens article = SplitArticle(u"A very quick brown fox jumps "_qs, u"He Walked home. "_qs);
     FakePageSource page;
     page.Pages.insert(kHost + u"/search?q=Quick"_qs, kQuickPage);
-    RecordingPresenter confirm;
-    LookupContext context{kHost, true, nullptr, &page, &confirm, 20000};
-    QCOMPARE(FetchAlternatives(u"Quick"_qs, QString(), 0, 1, context), u"core, heart"_qs);
-    QCOMPARE(page.Log, (QStringList{u"stop"_qs, u"navigate http://127.0.0.1:8080/search?q=Quick"_qs,
-                                    u"wait 20000"_qs}));
-    QVERIFY(confirm.Offers.isEmpty());
-}
-
-void TestThesaurus::offersMeanings()
-{
-    ArticleTokens article = SplitArticle(u"A very quick brown fox jumps "_qs, u"Body text "_qs);
-    FakePageSource page;
     page.Pages.insert(kHost + u"/search?q=quick"_qs, kQuickPage);
-    RecordingPresenter confirm;
-    LookupContext context{kHost, false, &article, &page, &confirm, 20000};
-
-    QCOMPARE(FetchAlternatives(u"quick"_qs, QString(), 0, 5, context), u"core, heart"_qs);
-    QCOMPARE(confirm.Offers.size(), 1);
-    const ConfirmOffer &offer = confirm.Offers.first();
-    QCOMPARE(offer.Word, u"quick"_qs);
-    QCOMPARE(offer.Suffix, QString());
-    QCOMPARE(offer.Question, u"Suggest the word closest in meaning to \"quick\""_qs);
-    QCOMPARE(offer.Caption, u"quick: confirm suggestions"_qs);
-    // Row 5 of the title: from token index 1 to the end of the title.
-    QCOMPARE(offer.Sentence, u" very quick brown fox jumps "_qs);
-    QCOMPARE(offer.List, 0);
-    QCOMPARE(offer.Row, 5);
-    QCOMPARE(Flatten(offer.Meanings),
-             (QStringList{u"quick|fast, rapid, speedy"_qs, u"quick|core, heart"_qs}));
-}
-
-void TestThesaurus::retriesWithStem_data()
-{
-    QTest::addColumn<bool>("manual");
-    QTest::newRow("manual") << true;
-    QTest::newRow("prompting") << false;
-}
-
-void TestThesaurus::retriesWithStem()
-{
-    QFETCH(bool, manual);
-    ArticleTokens article = SplitArticle(u"Walked "_qs, u"He Walked home. "_qs);
-    FakePageSource page;
     page.Pages.insert(kHost + u"/search?q=Walked"_qs, u"No results for Walked"_qs);
-    page.Pages.insert(kHost + u"/search?q=Walk"_qs,
-                      Meaning(u"walk"_qs, u"stroll, go on foot, March"_qs));
+    page.Pages.insert(kHost + u"/search?q=Walk"_qs, Meaning(u"walk"_qs, u"stroll, go on foot, March"_qs));
+    page.Completes = disturbance != u"expire"_qs;
+    if (disturbance == u"stop in wait"_qs)
+        page.OnWait = [] { StopProcessing = true; };
+    StopProcessing = disturbance == u"stop"_qs;
+    const int timeoutMs = page.Completes ? 20000 : 150;
     RecordingPresenter confirm;
-    LookupContext context{kHost, manual, &article, &page, &confirm, 20000};
+    const LookupContext context{disturbance == u"no host"_qs ? QString() : kHost, manual, &article, &page,
+                                &confirm, timeoutMs};
 
-    QCOMPARE(FetchAlternatives(u"Walked"_qs, QString(), 1, 3, context), u"strolled, marched"_qs);
-    QCOMPARE(page.Log, (QStringList{u"stop"_qs, u"navigate http://127.0.0.1:8080/search?q=Walked"_qs,
-                                    u"wait 20000"_qs, u"stop"_qs,
-                                    u"navigate http://127.0.0.1:8080/search?q=Walk"_qs,
-                                    u"wait 20000"_qs}));
-    if (manual) {
-        QVERIFY(confirm.Offers.isEmpty());
-        return;
-    }
-    QCOMPARE(confirm.Offers.size(), 1);
-    const ConfirmOffer &offer = confirm.Offers.first();
-    QCOMPARE(offer.Word, u"Walk"_qs);
-    QCOMPARE(offer.Suffix, u"ed"_qs);
-    QCOMPARE(offer.Question, u"Suggest the word closest in meaning to \"Walked\""_qs);
-    QCOMPARE(offer.Caption, u"Walk: confirm suggestions"_qs);
-    QCOMPARE(offer.Sentence, u" Walked home. "_qs);
-    QCOMPARE(offer.List, 1);
-    QCOMPARE(offer.Row, 3);
-    QCOMPARE(Flatten(offer.Meanings), (QStringList{u"walked|strolled, marched"_qs}));
-}
-
-void TestThesaurus::stopFlagRequestsNothing()
-{
-    StopProcessing = true;
-    FakePageSource page;
-    page.Pages.insert(kHost + u"/search?q=quick"_qs, kQuickPage);
-    RecordingPresenter confirm;
-    LookupContext context{kHost, true, nullptr, &page, &confirm, 20000};
-    QCOMPARE(FetchAlternatives(u"quick"_qs, QString(), 1, 1, context), QString());
-    QVERIFY(page.Log.isEmpty());
-}
-
-void TestThesaurus::stopDuringWaitSkipsOfferAndRetry()
-{
-    FakePageSource page;
-    page.Pages.insert(kHost + u"/search?q=quick"_qs, kQuickPage);
-    page.OnWait = [] { StopProcessing = true; };
-    RecordingPresenter confirm;
-    LookupContext context{kHost, false, nullptr, &page, &confirm, 20000};
-    // The page that finished loading is still read, but no window is offered.
-    QCOMPARE(FetchAlternatives(u"quick"_qs, QString(), 1, 1, context), u"core, heart"_qs);
-    QVERIFY(confirm.Offers.isEmpty());
-
-    StopProcessing = false;
-    page.Log.clear();
-    QCOMPARE(FetchAlternatives(u"walked"_qs, QString(), 1, 1, context), QString());
-    QCOMPARE(page.Log.size(), 3); // no request for the stem
-}
-
-void TestThesaurus::expiredWaitGivesNothing()
-{
-    FakePageSource page;
-    page.Completes = false;
-    page.Pages.insert(kHost + u"/search?q=walked"_qs, kQuickPage);
-    RecordingPresenter confirm;
-    LookupContext context{kHost, false, nullptr, &page, &confirm, 150};
-    QCOMPARE(FetchAlternatives(u"walked"_qs, QString(), 1, 1, context), QString());
-    QCOMPARE(page.Log, (QStringList{u"stop"_qs, u"navigate http://127.0.0.1:8080/search?q=walked"_qs,
-                                    u"wait 150"_qs}));
-    QVERIFY(confirm.Offers.isEmpty());
-}
-
-void TestThesaurus::noHostNoRequest()
-{
-    FakePageSource page;
-    RecordingPresenter confirm;
-    LookupContext context{QString(), false, nullptr, &page, &confirm, 20000};
-    QCOMPARE(FetchAlternatives(u"quick"_qs, QString(), 1, 1, context), QString());
-    QVERIFY(page.Log.isEmpty());
+    QCOMPARE(FetchAlternatives(word, QString(), list, row, context), expected);
+    QStringList log;
+    for (const QString &request : requests.split(u'|', Qt::SkipEmptyParts))
+        log << u"stop"_qs << u"navigate "_qs + kHost + u"/search?q="_qs + request
+            << u"wait "_qs + QString::number(timeoutMs);
+    QCOMPARE(page.Log, log);
+    QStringList shown;
+    for (const ConfirmOffer &o : confirm.Offers)
+        shown << o.Word << o.Suffix << o.Question << o.Caption << o.Sentence << QString::number(o.List)
+              << QString::number(o.Row) << Flatten(o.Meanings);
+    QCOMPARE(shown.join(u'|'), offer);
 }
 
 QTEST_GUILESS_MAIN(TestThesaurus)
