@@ -10,8 +10,9 @@ namespace verbloom {
 
 namespace {
 
-// The longest file name (in bytes) the file systems we run on accept.
-constexpr qsizetype kMaxFileNameBytes = 255;
+// The longest word file name in bytes: the file systems we run on accept 255, and an atomic save
+// first writes a temporary file named after it with seven more characters (".XXXXXX").
+constexpr qsizetype kMaxFileNameBytes = 255 - 7;
 
 } // namespace
 
