@@ -48,14 +48,14 @@ QByteArray ReadBytes(const QString &path)
     return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
 }
 
-// Every file and folder below `root` with its bytes, to show that a run wrote nothing.
+// Every file and folder below `root` with its bytes, to show what a run wrote.
 QMap<QString, QByteArray> Snapshot(const QString &root)
 {
     QMap<QString, QByteArray> tree;
     QDirIterator it(root, QDir::AllEntries | QDir::NoDotAndDotDot | QDir::Hidden, QDirIterator::Subdirectories);
     while (it.hasNext()) {
         const QString path = it.next();
-        tree.insert(path, it.fileInfo().isDir() ? QByteArray("<dir>") : ReadBytes(path));
+        tree.insert(path.mid(root.size() + 1), it.fileInfo().isDir() ? QByteArray("<dir>") : ReadBytes(path));
     }
     return tree;
 }
@@ -65,11 +65,10 @@ QStringList Files(const QString &folder)
     return QDir(folder).entryList(QDir::Files, QDir::Name);
 }
 
-// The first statement of an SQL file: up to and including its first ");" CR LF.
-QByteArray FirstStatement(const QByteArray &sql)
+// Arguments written as one text, separated by "|".
+QStringList Args(const QString &joined)
 {
-    const qsizetype end = sql.indexOf(");\r\n");
-    return end < 0 ? sql : sql.left(end + 4);
+    return joined.isEmpty() ? QStringList() : joined.split(u'|');
 }
 
 // Writes a small MyThes thesaurus (PATH.idx, PATH.dat): each entry is a word and its meaning
@@ -100,14 +99,10 @@ private slots:
     void matchesExportGoldenFiles();
     void matchesSiteGoldenFiles_data();
     void matchesSiteGoldenFiles();
-    void writesTextLayout_data();
-    void writesTextLayout();
-    void firstStatementHasCrLfLineBreaks();
-
-    void repeatsTheSequenceWithoutSeed_data();
-    void repeatsTheSequenceWithoutSeed();
-    void seedsStartOtherSequences();
-
+    void writesArticleAsEntered_data();
+    void writesArticleAsEntered();
+    void followsTheRandomSequence_data();
+    void followsTheRandomSequence();
     void listsNewWords_data();
     void listsNewWords();
 
@@ -126,12 +121,11 @@ private slots:
 private:
     BatchRun Run(const QStringList &arguments, const QMap<QString, QString> &environment = {});
     QStringList Article(const QString &title, const QString &contents);
-    void WriteWordFile(const QString &word, const QString &alternatives);
+    void WriteWordFile(const QString &word, const QString &alternatives)
+    {
+        QVERIFY(WordStore(m_home).WriteAlternatives(word, alternatives));
+    }
     QString Path(const QString &name) const { return m_dir->filePath(name); }
-    // The bytes the export writers make from the analysed article with the given random source:
-    // what the windows would write.
-    QByteArray LibrarySql(const QString &title, const QString &contents, int level, int count,
-                          RandomSource &random);
 
     std::unique_ptr<QTemporaryDir> m_dir;
     QString m_home;
@@ -180,56 +174,30 @@ QStringList TestBatch::Article(const QString &title, const QString &contents)
     return {u"--home"_qs, m_home, u"--title"_qs, title, u"--contents"_qs, file};
 }
 
-void TestBatch::WriteWordFile(const QString &word, const QString &alternatives)
-{
-    QVERIFY(WordStore(m_home).WriteAlternatives(word, alternatives));
-}
-
-QByteArray TestBatch::LibrarySql(const QString &title, const QString &contents, int level, int count,
-                                 RandomSource &random)
-{
-    ArticleBoxes boxes{title + u" "_qs, contents + u" "_qs};
-    const ArticleTokens article = SplitArticle(boxes.Title, boxes.Contents);
-    const WordStore store(m_home);
-    CachedWordFileAlternatives alternatives(store);
-    Spinner spinner(article, SpinSettings{WordTestSettings{}, level}, alternatives, random);
-    SpinnerVersionSource versions(spinner);
-    SqlExportOptions options{Path(u"library.sql"_qs), u"t"_qs, u"title"_qs, u"body"_qs, QString::number(count)};
-    if (ExportSql(options, boxes, versions).Outcome != ExportResult::Status::Written)
-        return {};
-    return ReadBytes(options.FileName);
-}
-
 // ---------------------------------------------------------------------------------------------
-// Golden files of the export and site writers
+// Output files
 
 void TestBatch::matchesExportGoldenFiles_data()
 {
     QTest::addColumn<QString>("golden");
-    QTest::addColumn<QStringList>("action"); // OUT stands for the output file
+    QTest::addColumn<QString>("action"); // OUT stands for the output file
     QTest::addColumn<bool>("firstStatementOnly");
-
     QTest::newRow("sql_count1.sql") << u"sql_count1.sql"_qs
-                                    << QStringList{u"--sql"_qs, u"OUT"_qs, u"--table"_qs, u"articles"_qs,
-                                                   u"--title-field"_qs, u"title"_qs, u"--article-field"_qs,
-                                                   u"body"_qs, u"--count"_qs, u"1"_qs}
+                                    << u"--sql|OUT|--table|articles|--title-field|title|--article-field|body|--count|1"_qs
                                     << false;
     QTest::newRow("sql_count3_5.sql, first statement, quoted field")
         << u"sql_count3_5.sql"_qs
-        << QStringList{u"--sql"_qs, u"OUT"_qs, u"--table"_qs, u"my table"_qs, u"--title-field"_qs, u"title"_qs,
-                       u"--article-field"_qs, u"body\"text\""_qs, u"--count"_qs, u"1"_qs}
-        << true;
+        << u"--sql|OUT|--table|my table|--title-field|title|--article-field|body\"text\"|--count|1"_qs << true;
     QTest::newRow("rss_1item.xml") << u"rss_1item.xml"_qs
-                                   << QStringList{u"--rss"_qs, u"OUT"_qs, u"--url"_qs,
-                                                  u"http://example.com/feed?a=1&b=2"_qs, u"--count"_qs, u" 1 "_qs,
-                                                  u"--description-chars"_qs, u"100"_qs}
+                                   << u"--rss|OUT|--url|http://example.com/feed?a=1&b=2|--count| 1 |"
+                                      "--description-chars|100"_qs
                                    << false;
 }
 
 void TestBatch::matchesExportGoldenFiles()
 {
     QFETCH(QString, golden);
-    QFETCH(QStringList, action);
+    QFETCH(QString, action);
     QFETCH(bool, firstStatementOnly);
 
     // Alternatives for every word: the first version is the article as entered all the same.
@@ -237,16 +205,17 @@ void TestBatch::matchesExportGoldenFiles()
                                 u"Water"_qs, u"often"_qs, u"well"_qs, u"done"_qs})
         WriteWordFile(word, u"alpha, beta"_qs);
     const QString output = m_out + u"/"_qs + golden;
-    action.replaceInStrings(u"OUT"_qs, output);
-    const BatchRun run = Run(Article(kExportTitle, kExportContents) + QStringList{u"--level"_qs, u"Maximum"_qs}
-                                 + action,
+    const BatchRun run = Run(Article(kExportTitle, kExportContents) + Args(u"--level|Maximum|"_qs + action)
+                                 .replaceInStrings(u"OUT"_qs, output),
                              {{u"SOURCE_DATE_EPOCH"_qs, kGoldenEpoch}, {u"TZ"_qs, kUtcPlusOne}});
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(run.Out, QByteArray());
-    const QByteArray expected = ReadBytes(kExportData + u"/"_qs + golden);
+    QByteArray expected = ReadBytes(kExportData + u"/"_qs + golden);
     QVERIFY(!expected.isEmpty());
-    QCOMPARE(ReadBytes(output), firstStatementOnly ? FirstStatement(expected) : expected);
+    if (firstStatementOnly) // up to and including the first ");" CR LF
+        expected.truncate(expected.indexOf(");\r\n") + 4);
+    QCOMPARE(ReadBytes(output), expected);
 }
 
 void TestBatch::matchesSiteGoldenFiles_data()
@@ -257,36 +226,29 @@ void TestBatch::matchesSiteGoldenFiles_data()
     QTest::addColumn<bool>("lowercase");
     QTest::addColumn<bool>("index");
     QTest::addColumn<bool>("sitemap");
-    QTest::addColumn<QStringList>("flags");
+    QTest::addColumn<QString>("flags");
     QTest::addColumn<QStringList>("compared"); // files whose every byte can be reproduced
 
     // Pages 2 onward carry customized versions, which the golden files do not hold; page 1 carries
     // the article as entered, and the site map only names the pages.
     QTest::newRow("0 pages") << u"site_0pages"_qs << u"Garden Tips"_qs << u"Link"_qs << true << true << true
-                             << QStringList{u"--pages"_qs, u"0"_qs}
-                             << QStringList{u"index.htm"_qs, u"sitemap.htm"_qs};
-    QTest::newRow("25 x 10, options of config.txt")
-        << u"site_25x10"_qs << u"Garden Tips"_qs << u"Link"_qs << true << true << true << QStringList{}
-        << QStringList{u"page1.htm"_qs, u"sitemap.htm"_qs};
+                             << u"--pages|0"_qs << QStringList{u"index.htm"_qs, u"sitemap.htm"_qs};
+    QTest::newRow("25 x 10, options of config.txt") << u"site_25x10"_qs << u"Garden Tips"_qs << u"Link"_qs << true
+                                                    << true << true << QString()
+                                                    << QStringList{u"page1.htm"_qs, u"sitemap.htm"_qs};
     QTest::newRow("3 x 10, cleaned caption, extension flag")
         << u"site_3x10"_qs << u"Garden #CONTENT# Tips"_qs << u"My Link"_qs << false << true << false
-        << QStringList{u"--pages"_qs, u"3"_qs, u"--links"_qs, u"10"_qs, u"--extension"_qs, u"HTML"_qs}
-        << QStringList{u"page1.HTML"_qs};
+        << u"--pages|3|--links|10|--extension|HTML"_qs << QStringList{u"page1.HTML"_qs};
     QTest::newRow("lowercase caption, no index")
         << u"site_caption_lower"_qs << u"Garden Tips"_qs << u"My Link"_qs << true << false << true
-        << QStringList{u"--pages"_qs, u"2"_qs, u"--links"_qs, u"3"_qs, u"--template"_qs, u"plain.htm"_qs}
-        << QStringList{u"page1.htm"_qs, u"sitemap.htm"_qs};
+        << u"--pages|2|--links|3|--template|plain.htm"_qs << QStringList{u"page1.htm"_qs, u"sitemap.htm"_qs};
 }
 
 void TestBatch::matchesSiteGoldenFiles()
 {
     QFETCH(QString, golden);
     QFETCH(QString, title);
-    QFETCH(QString, caption);
-    QFETCH(bool, lowercase);
-    QFETCH(bool, index);
-    QFETCH(bool, sitemap);
-    QFETCH(QStringList, flags);
+    QFETCH(QString, flags);
     QFETCH(QStringList, compared);
 
     // The options window saved these; the stored output folder is never used.
@@ -298,16 +260,20 @@ void TestBatch::matchesSiteGoldenFiles()
     options.LeftCode = u"<i>Left</i>"_qs;
     options.RightCode = u"Right & more"_qs;
     options.BottomCode = u"(c) 2026\r\nAll rights reserved"_qs;
+    QFETCH(QString, caption);
     options.NavigationLinkName = caption;
+    QFETCH(bool, lowercase);
     options.FileNamesSmallCase = lowercase;
+    QFETCH(bool, index);
     options.CreateIndex = index;
+    QFETCH(bool, sitemap);
     options.CreateSiteMap = sitemap;
     QVERIFY(!SaveConfig(m_home, options));
     const QByteArray config = ReadBytes(m_home + u"/config.txt"_qs);
     WriteWordFile(u"Garden"_qs, u"Yard"_qs);
     WriteWordFile(u"Plant"_qs, u"Sow, Seed"_qs);
 
-    const BatchRun run = Run(Article(title, kSiteContents) + QStringList{u"--site"_qs, m_out} + flags);
+    const BatchRun run = Run(Article(title, kSiteContents) + QStringList{u"--site"_qs, m_out} + Args(flags));
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
     const QString expectedFolder = kSiteData + u"/"_qs + golden;
@@ -317,55 +283,46 @@ void TestBatch::matchesSiteGoldenFiles()
     QCOMPARE(ReadBytes(m_home + u"/config.txt"_qs), config); // a batch run keeps the stored options
 }
 
-void TestBatch::writesTextLayout_data()
+void TestBatch::writesArticleAsEntered_data()
 {
     QTest::addColumn<QString>("title");
     QTest::addColumn<QString>("contents");
+    QTest::addColumn<QString>("action"); // OUT stands for the output file, which exists already
     QTest::addColumn<QByteArray>("expected");
-    QTest::newRow("T and C") << u"T"_qs << u"C"_qs << QByteArray("T\r\n\r\nC ");
-    QTest::newRow("blanks kept, line breaks as CR LF")
-        << u"Hello, world "_qs << u"a\r\nb\rc\nd "_qs << QByteArray("Hello, world\r\n\r\na\r\nb\r\nc\r\nd ");
-    QTest::newRow("ends with a line break") << u"x"_qs << u"end\r\n"_qs << QByteArray("x\r\n\r\nend\r\n ");
+    QTest::newRow("text: T and C") << u"T"_qs << u"C"_qs << u"--text|OUT"_qs << QByteArray("T\r\n\r\nC ");
+    QTest::newRow("text: blanks kept, line breaks as CR LF") << u"Hello, world "_qs << u"a\r\nb\rc\nd "_qs
+                                                             << u"--text|OUT"_qs
+                                                             << QByteArray("Hello, world\r\n\r\na\r\nb\r\nc\r\nd ");
+    QTest::newRow("sql: the first statement has CR LF line breaks")
+        << u"T"_qs << u"a\nb\rc"_qs << u"--sql|OUT|--table|t|--title-field|x|--article-field|y|--count|1"_qs
+        << QByteArray("INSERT INTO t (x,y) VALUES (\"T \",\"a\r\nb\r\nc \");\r\n");
 }
 
-void TestBatch::writesTextLayout()
+void TestBatch::writesArticleAsEntered()
 {
     QFETCH(QString, title);
     QFETCH(QString, contents);
-    QFETCH(QByteArray, expected);
-    const QString output = m_out + u"/version.txt"_qs;
-    QVERIFY(WriteTextFile(output, u"older text"_qs));
-    const BatchRun run = Run(Article(title, contents) + QStringList{u"--text"_qs, output});
+    QFETCH(QString, action);
+    const QString output = m_out + u"/version"_qs;
+    QVERIFY(WriteTextFile(output, u"an older and longer text"_qs));
+    const BatchRun run = Run(Article(title, contents) + Args(action).replaceInStrings(u"OUT"_qs, output));
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
-    QCOMPARE(ReadBytes(output), expected);
+    QTEST(ReadBytes(output), "expected");
 }
 
-void TestBatch::firstStatementHasCrLfLineBreaks()
+void TestBatch::followsTheRandomSequence_data()
 {
-    const QString output = m_out + u"/lines.sql"_qs;
-    const BatchRun run = Run(Article(u"T"_qs, u"a\nb\rc"_qs)
-                             + QStringList{u"--sql"_qs, output, u"--table"_qs, u"t"_qs, u"--title-field"_qs,
-                                           u"x"_qs, u"--article-field"_qs, u"y"_qs, u"--count"_qs, u"1"_qs});
-    QCOMPARE(run.ExitCode, 0);
-    QCOMPARE(ReadBytes(output), QByteArray("INSERT INTO t (x,y) VALUES (\"T \",\"a\r\nb\r\nc \");\r\n"));
-}
-
-// ---------------------------------------------------------------------------------------------
-// Random draws
-
-void TestBatch::repeatsTheSequenceWithoutSeed_data()
-{
-    QTest::addColumn<QStringList>("seed");
+    QTest::addColumn<QString>("seed");
     QTest::addColumn<quint32>("librarySeed");
-    QTest::newRow("no seed: the never-seeded sequence") << QStringList{} << quint32(std::mt19937::default_seed);
-    QTest::newRow("seed 1") << QStringList{u"--seed"_qs, u"1"_qs} << quint32(1);
-    QTest::newRow("seed 4294967295") << QStringList{u"--seed"_qs, u"4294967295"_qs} << quint32(4294967295u);
+    QTest::newRow("no seed: the never-seeded sequence") << QString() << quint32(std::mt19937::default_seed);
+    QTest::newRow("seed 1") << u"--seed|1"_qs << quint32(1);
+    QTest::newRow("seed 4294967295") << u"--seed|4294967295"_qs << quint32(4294967295u);
 }
 
-void TestBatch::repeatsTheSequenceWithoutSeed()
+void TestBatch::followsTheRandomSequence()
 {
-    QFETCH(QStringList, seed);
+    QFETCH(QString, seed);
     QFETCH(quint32, librarySeed);
     const QString title = u"Garden tips for busy people"_qs;
     const QString contents = u"Plant flowers early.\r\nWater flowers often, people say; gardens reward patience."_qs;
@@ -373,71 +330,50 @@ void TestBatch::repeatsTheSequenceWithoutSeed()
                                 u"early"_qs, u"water"_qs, u"often"_qs, u"gardens"_qs, u"reward"_qs, u"patience"_qs})
         WriteWordFile(word, word + u"A, "_qs + word + u"B, "_qs + word + u"C"_qs);
 
-    const QStringList sql{u"--table"_qs, u"t"_qs, u"--title-field"_qs, u"title"_qs, u"--article-field"_qs,
-                          u"body"_qs, u"--count"_qs, u"25"_qs, u"--level"_qs, u"Maximum"_qs};
-    const QStringList first = Article(title, contents) + seed + sql + QStringList{u"--sql"_qs, Path(u"1.sql"_qs)};
-    const QStringList second = Article(title, contents) + seed + sql + QStringList{u"--sql"_qs, Path(u"2.sql"_qs)};
-    QCOMPARE(Run(first).ExitCode, 0);
-    QCOMPARE(Run(second).ExitCode, 0);
+    // Two identical runs give identical files.
+    const QStringList sql = Args(seed) + Args(u"--table|t|--title-field|title|--article-field|body|--count|25|"
+                                              "--level|Maximum|--sql"_qs);
+    QCOMPARE(Run(Article(title, contents) + sql + QStringList{Path(u"1.sql"_qs)}).ExitCode, 0);
+    QCOMPARE(Run(Article(title, contents) + sql + QStringList{Path(u"2.sql"_qs)}).ExitCode, 0);
     const QByteArray output = ReadBytes(Path(u"1.sql"_qs));
     QCOMPARE(ReadBytes(Path(u"2.sql"_qs)), output);
-    // The same bytes as the export window would write with that sequence.
-    MersenneRandomSource random(librarySeed);
-    QCOMPARE(output, LibrarySql(title, contents, 0, 25, random));
     QCOMPARE(output.count("INSERT INTO"), 25);
-}
 
-void TestBatch::seedsStartOtherSequences()
-{
-    WriteWordFile(u"garden"_qs, u"yard, park, plot, field"_qs);
-    WriteWordFile(u"flowers"_qs, u"blooms, blossoms, petals"_qs);
-    const QStringList base = Article(u"Garden"_qs, u"Flowers flowers flowers garden garden garden."_qs)
-        + QStringList{u"--level"_qs, u"Maximum"_qs, u"--table"_qs, u"t"_qs, u"--title-field"_qs, u"a"_qs,
-                      u"--article-field"_qs, u"b"_qs, u"--count"_qs, u"8"_qs};
-    QMap<QString, QByteArray> outputs;
-    for (const QString &seed : {u""_qs, u"1"_qs, u"2"_qs, u"5489"_qs}) {
-        const QString path = Path(u"seed"_qs + seed + u".sql"_qs);
-        QStringList arguments = base + QStringList{u"--sql"_qs, path};
-        if (!seed.isEmpty())
-            arguments << u"--seed"_qs << seed;
-        QCOMPARE(Run(arguments).ExitCode, 0);
-        outputs.insert(seed, ReadBytes(path));
-    }
-    QVERIFY(outputs[u""_qs] != outputs[u"1"_qs]);
-    QVERIFY(outputs[u"1"_qs] != outputs[u"2"_qs]);
-    // The never-seeded sequence is the generator's default start.
-    QCOMPARE(outputs[u"5489"_qs], outputs[u""_qs]);
+    // The same bytes as the export window writes with that sequence.
+    ArticleBoxes boxes{title + u" "_qs, contents + u" "_qs};
+    const ArticleTokens article = SplitArticle(boxes.Title, boxes.Contents);
+    const WordStore store(m_home);
+    CachedWordFileAlternatives alternatives(store);
+    MersenneRandomSource random(librarySeed);
+    Spinner spinner(article, SpinSettings{WordTestSettings{}, 0}, alternatives, random);
+    SpinnerVersionSource versions(spinner);
+    const SqlExportOptions options{Path(u"library.sql"_qs), u"t"_qs, u"title"_qs, u"body"_qs, u"25"_qs};
+    QCOMPARE(ExportSql(options, boxes, versions).Outcome, ExportResult::Status::Written);
+    QCOMPARE(output, ReadBytes(options.FileName));
 }
-
-// ---------------------------------------------------------------------------------------------
-// --list-new
 
 void TestBatch::listsNewWords_data()
 {
-    QTest::addColumn<QStringList>("settings");
+    QTest::addColumn<QString>("settings");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("defaults") << QStringList{} << u"Tips\nFlowers\nquickly\nbloom\n"_qs;
-    QTest::newRow("ignored words, any case")
-        << QStringList{u"--ignore"_qs, u"FLOWERS"_qs, u"--ignore"_qs, u"tips"_qs} << u"quickly\nbloom\n"_qs;
-    QTest::newRow("ignore shorter 5") << QStringList{u"--ignore-shorter"_qs, u"5"_qs} << u"Flowers\nquickly\n"_qs;
-    QTest::newRow("ignore shorter 2") << QStringList{u"--ignore-shorter"_qs, u"2"_qs}
-                                      << u"Tips\nfor\nFlowers\nquickly\nsun\nbloom\n"_qs;
+    QTest::newRow("defaults") << QString() << u"Tips\nFlowers\nquickly\nbloom\n"_qs;
+    QTest::newRow("ignored words, any case") << u"--ignore|FLOWERS|--ignore|tips"_qs << u"quickly\nbloom\n"_qs;
+    QTest::newRow("ignore shorter 5") << u"--ignore-shorter|5"_qs << u"Flowers\nquickly\n"_qs;
+    QTest::newRow("ignore shorter 2") << u"--ignore-shorter|2"_qs << u"Tips\nfor\nFlowers\nquickly\nsun\nbloom\n"_qs;
 }
 
 void TestBatch::listsNewWords()
 {
-    QFETCH(QStringList, settings);
-    QFETCH(QString, expected);
+    QFETCH(QString, settings);
     WriteWordFile(u"garden"_qs, u"yard"_qs);
     WriteWordFile(u"known"_qs, QString()); // a known word without alternatives
     const QMap<QString, QByteArray> before = Snapshot(m_home);
     // "Garden" has a file (names ignore case); numbers, "C#" and repeats are not listed again.
-    const BatchRun run = Run(Article(u"Garden Tips for 2024"_qs,
-                                     u"Flowers quickly known, C# mp3 sun;\r\nflowers FLOWERS bloom."_qs)
-                             + settings + QStringList{u"--list-new"_qs});
+    const QString contents = u"Flowers quickly known, C# mp3 sun;\r\nflowers FLOWERS bloom."_qs;
+    const BatchRun run = Run(Article(u"Garden Tips for 2024"_qs, contents) + Args(settings) + QStringList{u"--list-new"_qs});
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
-    QCOMPARE(QString::fromUtf8(run.Out), expected);
+    QTEST(QString::fromUtf8(run.Out), "expected");
     QCOMPARE(Snapshot(m_home), before); // without --lookup no word file is written
 }
 
@@ -449,116 +385,67 @@ void TestBatch::refusesBadInput_data()
     QTest::addColumn<QStringList>("arguments"); // after the home; OUT stands for the output folder
     QTest::addColumn<int>("exitCode");
     QTest::addColumn<QString>("message");       // the first line on stderr, after "verbloom-batch: "
-
-    const QStringList article{u"--title"_qs, u"Garden Tips"_qs, u"--contents-text"_qs, u"Plant early."_qs};
-    const QStringList sql{u"--table"_qs, u"t"_qs, u"--title-field"_qs, u"a"_qs, u"--article-field"_qs, u"b"_qs};
-    const QStringList sqlTo = QStringList{u"--sql"_qs, u"OUT/x.sql"_qs} + sql;
-    const QStringList rss{u"--rss"_qs, u"OUT/x.xml"_qs, u"--url"_qs, u"http://x"_qs, u"--description-chars"_qs,
-                          u"50"_qs};
-    const QStringList site{u"--site"_qs, u"OUT"_qs};
+    const auto row = [](const char *name, const QStringList &pieces, int exitCode, const QString &message) {
+        QTest::newRow(name) << Args(pieces.join(u'|')) << exitCode << message;
+    };
+    const QString article = u"--title|Garden Tips|--contents-text|Plant early."_qs;
+    const QString sql = u"--sql|OUT/x.sql|--table|t|--title-field|a|--article-field|b"_qs;
+    const QString rss = u"--rss|OUT/x.xml|--url|http://x|--description-chars|50"_qs;
+    const QString site = u"--site|OUT"_qs;
+    const QString seed = u"--seed takes a whole number from 0 to 4294967295, not "_qs;
 
     // Usage errors.
-    QTest::newRow("missing action") << article << 2
-                                    << u"no action: give one of --text, --sql, --rss, --site or --list-new"_qs;
-    QTest::newRow("two actions") << article + sqlTo + QStringList{u"--list-new"_qs} << 2
-                                 << u"one action at a time, not --sql and --list-new"_qs;
-    QTest::newRow("unknown level") << article + QStringList{u"--level"_qs, u"Level 4"_qs, u"--list-new"_qs} << 2
-                                   << u"unknown level \"Level 4\": use Maximum, \"Level 3\", \"Level 2\", "
-                                      "\"Level 1\" or Minimum"_qs;
-    QTest::newRow("ignore shorter 6") << article + QStringList{u"--ignore-shorter"_qs, u"6"_qs, u"--list-new"_qs}
-                                      << 2 << u"--ignore-shorter takes 2, 3, 4 or 5, not \"6\""_qs;
-    QTest::newRow("negative seed") << article + QStringList{u"--seed"_qs, u"-1"_qs, u"--list-new"_qs} << 2
-                                   << u"--seed takes a whole number from 0 to 4294967295, not \"-1\""_qs;
-    QTest::newRow("seed too large") << article + QStringList{u"--seed"_qs, u"4294967296"_qs, u"--list-new"_qs}
-                                    << 2 << u"--seed takes a whole number from 0 to 4294967295, not \"4294967296\""_qs;
-    QTest::newRow("seed beyond 64 bits") << article + QStringList{u"--seed"_qs, u"99999999999999999999"_qs,
-                                                                  u"--list-new"_qs}
-                                         << 2
-                                         << u"--seed takes a whole number from 0 to 4294967295, not "
-                                            "\"99999999999999999999\""_qs;
-    QTest::newRow("no title") << QStringList{u"--contents-text"_qs, u"x"_qs, u"--list-new"_qs} << 2
-                              << u"--title is missing"_qs;
-    QTest::newRow("two contents") << article + QStringList{u"--contents"_qs, u"f"_qs, u"--list-new"_qs} << 2
-                                  << u"--contents and --contents-text cannot be used together"_qs;
-    QTest::newRow("title twice") << article + QStringList{u"--title"_qs, u"x"_qs, u"--list-new"_qs} << 2
-                                 << u"--title is given more than once"_qs;
-    QTest::newRow("option of another action") << article + rss + QStringList{u"--count"_qs, u"2"_qs,
-                                                                             u"--table"_qs, u"t"_qs}
-                                              << 2 << u"--table is used only with --sql"_qs;
-    QTest::newRow("required option") << article + QStringList{u"--sql"_qs, u"OUT/x.sql"_qs, u"--table"_qs, u"t"_qs}
-                                     << 2 << u"--sql needs --title-field"_qs;
-    QTest::newRow("unknown option") << article + QStringList{u"--list-new"_qs, u"--colour"_qs} << 2
-                                    << u"Unknown option 'colour'."_qs;
-    QTest::newRow("stray argument") << article + QStringList{u"--list-new"_qs, u"extra"_qs} << 2
-                                    << u"unexpected argument \"extra\""_qs;
+    row("missing action", {article}, 2, u"no action: give one of --text, --sql, --rss, --site or --list-new"_qs);
+    row("two actions", {article, sql, u"--list-new"_qs}, 2, u"one action at a time, not --sql and --list-new"_qs);
+    row("unknown level", {article, u"--level|Level 4|--list-new"_qs}, 2,
+        u"unknown level \"Level 4\": use Maximum, \"Level 3\", \"Level 2\", \"Level 1\" or Minimum"_qs);
+    row("ignore shorter 6", {article, u"--ignore-shorter|6|--list-new"_qs}, 2,
+        u"--ignore-shorter takes 2, 3, 4 or 5, not \"6\""_qs);
+    row("negative seed", {article, u"--seed|-1|--list-new"_qs}, 2, seed + u"\"-1\""_qs);
+    row("seed too large", {article, u"--seed|4294967296|--list-new"_qs}, 2, seed + u"\"4294967296\""_qs);
+    row("seed beyond 64 bits", {article, u"--seed|99999999999999999999|--list-new"_qs}, 2,
+        seed + u"\"99999999999999999999\""_qs);
+    row("no title", {u"--contents-text|x|--list-new"_qs}, 2, u"--title is missing"_qs);
+    row("two contents", {article, u"--contents|f|--list-new"_qs}, 2,
+        u"--contents and --contents-text cannot be used together"_qs);
+    row("title twice", {article, u"--title|x|--list-new"_qs}, 2, u"--title is given more than once"_qs);
+    row("option of another action", {article, rss, u"--count|2|--table|t"_qs}, 2, u"--table is used only with --sql"_qs);
+    row("required option", {article, u"--sql|OUT/x.sql|--table|t"_qs}, 2, u"--sql needs --title-field"_qs);
+    row("unknown option", {article, u"--list-new|--colour"_qs}, 2, u"Unknown option 'colour'."_qs);
+    row("stray argument", {article, u"--list-new|extra"_qs}, 2, u"unexpected argument \"extra\""_qs);
 
     // The main window's checks, in its order.
-    QTest::newRow("blank title") << QStringList{u"--title"_qs, u"   "_qs, u"--contents-text"_qs, u"x"_qs,
-                                                u"--list-new"_qs}
-                                 << 1 << u"The title cannot be blank."_qs;
-    QTest::newRow("both blank: the title first") << QStringList{u"--title"_qs, u""_qs, u"--contents-text"_qs,
-                                                                u" "_qs, u"--list-new"_qs}
-                                                 << 1 << u"The title cannot be blank."_qs;
-    QTest::newRow("blank contents") << QStringList{u"--title"_qs, u" a"_qs, u"--contents-text"_qs, u"  "_qs,
-                                                   u"--list-new"_qs}
-                                    << 1 << u"The contents cannot be blank."_qs;
-    QTest::newRow("missing contents file") << QStringList{u"--title"_qs, u"a"_qs, u"--contents"_qs,
-                                                          u"OUT/none.txt"_qs, u"--list-new"_qs}
-                                           << 1 << u"The contents file could not be read: OUT/none.txt"_qs;
-    QTest::newRow("ignored word too short") << article + QStringList{u"--ignore"_qs, u"seo"_qs, u"--list-new"_qs}
-                                            << 1
-                                            << u"Please make sure that the number of letters in ignore word is "
-                                               "more than 3"_qs;
-    QTest::newRow("ignored word with two marks") << article + QStringList{u"--ignore"_qs, u"a.b,cd"_qs,
-                                                                          u"--list-new"_qs}
-                                                 << 1 << u"Please make sure that the letter \",\" is NOT there in "
-                                                         "your word"_qs;
+    row("blank title", {u"--title|   |--contents-text|x|--list-new"_qs}, 1, u"The title cannot be blank."_qs);
+    row("both blank: the title first", {u"--title||--contents-text| |--list-new"_qs}, 1,
+        u"The title cannot be blank."_qs);
+    row("blank contents", {u"--title| a|--contents-text|  |--list-new"_qs}, 1, u"The contents cannot be blank."_qs);
+    row("missing contents file", {u"--title|a|--contents|OUT/none.txt|--list-new"_qs}, 1,
+        u"The contents file could not be read: OUT/none.txt"_qs);
+    row("ignored word too short", {article, u"--ignore|seo|--list-new"_qs}, 1,
+        u"Please make sure that the number of letters in ignore word is more than 3"_qs);
 
-    // The export windows' checks.
-    QTest::newRow("sql count 0") << article + sqlTo + QStringList{u"--count"_qs, u"0"_qs} << 1
-                                 << u"No of article to insert should be between 1 and 32767"_qs;
-    QTest::newRow("sql count 32768") << article + sqlTo + QStringList{u"--count"_qs, u"32768"_qs} << 1
-                                     << u"No of article to insert should be between 1 and 32767"_qs;
-    QTest::newRow("sql count word") << article + sqlTo + QStringList{u"--count"_qs, u"ten"_qs} << 1
-                                    << u"No of article to insert should be numeric"_qs;
-    QTest::newRow("sql empty table") << article + QStringList{u"--sql"_qs, u"OUT/x.sql"_qs, u"--table"_qs, u""_qs,
-                                                              u"--title-field"_qs, u"a"_qs, u"--article-field"_qs,
-                                                              u"b"_qs}
-                                     << 1 << u"Please enter Table name"_qs;
-    QTest::newRow("rss count 0") << article + rss + QStringList{u"--count"_qs, u"0"_qs} << 1
-                                 << u"No of record should be between 1 and 32767"_qs;
-    QTest::newRow("rss count 40000") << article + rss + QStringList{u"--count"_qs, u"40000"_qs} << 1
-                                     << u"No of record should not be more than 32767"_qs;
-    QTest::newRow("rss empty url") << article + QStringList{u"--rss"_qs, u"OUT/x.xml"_qs, u"--url"_qs, u""_qs,
-                                                            u"--count"_qs, u"2"_qs, u"--description-chars"_qs,
-                                                            u"5"_qs}
-                                   << 1 << u"Please enter url"_qs;
-    QTest::newRow("rss characters word") << article + QStringList{u"--rss"_qs, u"OUT/x.xml"_qs, u"--url"_qs,
-                                                                  u"u"_qs, u"--count"_qs, u"2"_qs,
-                                                                  u"--description-chars"_qs, u"many"_qs}
-                                         << 1 << u"no of character for description should be numeric"_qs;
-
-    // The site options window's checks.
-    QTest::newRow("site pages 32768") << article + site + QStringList{u"--pages"_qs, u"32768"_qs} << 1
-                                      << u"Number of pages to generate should be between 0 and 32767"_qs;
-    QTest::newRow("site links word") << article + site + QStringList{u"--links"_qs, u"ten"_qs} << 1
-                                     << u"Number of links in menu per page should be numeric"_qs;
-    QTest::newRow("site empty extension") << article + site + QStringList{u"--extension"_qs, u""_qs} << 1
-                                          << u"Please enter the file extension"_qs;
-    QTest::newRow("site folder missing") << article + QStringList{u"--site"_qs, u"OUT/none"_qs} << 1
-                                         << u"Output folder does't exist"_qs;
-    QTest::newRow("site unknown template") << article + site + QStringList{u"--template"_qs, u"none.htm"_qs} << 1
-                                           << u"The template \"none.htm\" is not in the folder HOME/templates"_qs;
+    // The export and site windows' checks (each message is tested with its window).
+    row("sql count 0", {article, sql, u"--count|0"_qs}, 1, u"No of article to insert should be between 1 and 32767"_qs);
+    row("sql count 32768", {article, sql, u"--count|32768"_qs}, 1,
+        u"No of article to insert should be between 1 and 32767"_qs);
+    row("sql empty table", {article, u"--sql|OUT/x.sql|--table||--title-field|a|--article-field|b"_qs}, 1,
+        u"Please enter Table name"_qs);
+    row("rss count 0", {article, rss, u"--count|0"_qs}, 1, u"No of record should be between 1 and 32767"_qs);
+    row("rss count 40000", {article, rss, u"--count|40000"_qs}, 1, u"No of record should not be more than 32767"_qs);
+    row("rss empty url", {article, u"--rss|OUT/x.xml|--url||--count|2|--description-chars|5"_qs}, 1,
+        u"Please enter url"_qs);
+    row("site pages 32768", {article, site, u"--pages|32768"_qs}, 1,
+        u"Number of pages to generate should be between 0 and 32767"_qs);
+    row("site folder missing", {article, u"--site|OUT/none"_qs}, 1, u"Output folder does't exist"_qs);
+    row("site unknown template", {article, site, u"--template|none.htm"_qs}, 1,
+        u"The template \"none.htm\" is not in the folder HOME/templates"_qs);
 
     // Output that cannot be written.
-    QTest::newRow("sql into a missing folder") << article + QStringList{u"--sql"_qs, u"OUT/no/x.sql"_qs} + sql << 1
-                                               << u"File could not be saved as OUT/no/x.sql"_qs;
-    QTest::newRow("rss into a missing folder") << article + QStringList{u"--rss"_qs, u"OUT/no/x.xml"_qs,
-                                                                        u"--url"_qs, u"u"_qs, u"--count"_qs, u"1"_qs,
-                                                                        u"--description-chars"_qs, u"9"_qs}
-                                               << 1 << u"File could not be saved as OUT/no/x.xml"_qs;
-    QTest::newRow("text over a folder") << article + QStringList{u"--text"_qs, u"OUT"_qs} << 1
-                                        << u"File could not be saved as OUT"_qs;
+    row("sql into a missing folder", {article, u"--sql|OUT/no/x.sql|--table|t|--title-field|a|--article-field|b"_qs},
+        1, u"File could not be saved as OUT/no/x.sql"_qs);
+    row("rss into a missing folder", {article, u"--rss|OUT/no/x.xml|--url|u|--count|1|--description-chars|9"_qs}, 1,
+        u"File could not be saved as OUT/no/x.xml"_qs);
+    row("text over a folder", {article, u"--text|OUT"_qs}, 1, u"File could not be saved as OUT"_qs);
 }
 
 void TestBatch::refusesBadInput()
@@ -582,8 +469,7 @@ void TestBatch::refusesBadInput()
 void TestBatch::refusesBadDateEpoch()
 {
     const QStringList arguments = Article(u"T"_qs, u"C"_qs)
-        + QStringList{u"--rss"_qs, m_out + u"/feed.xml"_qs, u"--url"_qs, u"u"_qs, u"--count"_qs, u"1"_qs,
-                      u"--description-chars"_qs, u"9"_qs};
+        + Args(u"--rss|"_qs + m_out + u"/feed.xml|--url|u|--count|1|--description-chars|9"_qs);
     const BatchRun run = Run(arguments, {{u"SOURCE_DATE_EPOCH"_qs, u"yesterday"_qs}});
     QCOMPARE(run.ExitCode, 2);
     QVERIFY(run.Err.startsWith("verbloom-batch: SOURCE_DATE_EPOCH must be a number of seconds since "
@@ -597,8 +483,8 @@ void TestBatch::refusesBadDateEpoch()
 void TestBatch::siteAsksForForceOverExistingIndex()
 {
     QVERIFY(WriteTextFile(m_out + u"/index.htm"_qs, u"old index"_qs));
-    const QStringList arguments = Article(u"Garden Tips"_qs, kSiteContents)
-        + QStringList{u"--site"_qs, m_out, u"--pages"_qs, u"2"_qs};
+    const QStringList arguments = Article(u"Garden Tips"_qs, kSiteContents) + QStringList{u"--site"_qs, m_out}
+        + Args(u"--pages|2"_qs);
     const QMap<QString, QByteArray> before = Snapshot(m_dir->path());
     BatchRun run = Run(arguments);
     QCOMPARE(run.ExitCode, 1);
@@ -617,8 +503,8 @@ void TestBatch::siteAsksForForceOverExistingIndex()
 void TestBatch::reportsSiteFilesThatFail()
 {
     QVERIFY(QDir().mkpath(m_out + u"/page2.htm"_qs)); // a folder where a page should go
-    const BatchRun run = Run(Article(u"Garden Tips"_qs, kSiteContents)
-                             + QStringList{u"--site"_qs, m_out, u"--pages"_qs, u"3"_qs});
+    const BatchRun run = Run(Article(u"Garden Tips"_qs, kSiteContents) + QStringList{u"--site"_qs, m_out}
+                             + Args(u"--pages|3"_qs));
     QCOMPARE(run.ExitCode, 1);
     QCOMPARE(QString::fromUtf8(run.Err),
              u"verbloom-batch: 1 of 5 files could not be written:\n"_qs + m_out + u"/page2.htm\n"_qs);
@@ -645,30 +531,24 @@ void TestBatch::lookupWritesWordFiles()
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(QString::fromUtf8(run.Out), u"Garden\nTips\nflowers\nbloom\nquickly\n"_qs);
 
-    // "Manual": the last meaning's synonyms; a word without entry is known without alternatives.
-    const QString folder = m_home + u"/data/"_qs;
-    QCOMPARE(Files(folder), (QStringList{u"bloom.dat"_qs, u"flowers.dat"_qs, u"garden.dat"_qs, u"plant.dat"_qs,
-                                         u"quickly.dat"_qs, u"tips.dat"_qs}));
-    QCOMPARE(ReadBytes(folder + u"garden.dat"_qs), QByteArray("cultivate, grow"));
-    QCOMPARE(ReadBytes(folder + u"bloom.dat"_qs), QByteArray("blossom, flower"));
-    QCOMPARE(ReadBytes(folder + u"quickly.dat"_qs), QByteArray("rapidly, speedily, fast"));
-    QCOMPARE(ReadBytes(folder + u"tips.dat"_qs), QByteArray());
-    QCOMPARE(ReadBytes(folder + u"flowers.dat"_qs), QByteArray());
-    QCOMPARE(ReadBytes(folder + u"plant.dat"_qs), QByteArray("sow, seed")); // from its file, not looked up
+    // "Manual": the last meaning's synonyms; a word without entry is known without alternatives;
+    // "plant" keeps its file and is not looked up.
+    const QMap<QString, QByteArray> wordFiles{{u"bloom.dat"_qs, "blossom, flower"}, {u"flowers.dat"_qs, ""},
+                                              {u"garden.dat"_qs, "cultivate, grow"}, {u"plant.dat"_qs, "sow, seed"},
+                                              {u"quickly.dat"_qs, "rapidly, speedily, fast"}, {u"tips.dat"_qs, ""}};
+    QCOMPARE(Snapshot(m_home + u"/data"_qs), wordFiles);
 
-    // The next run finds every word.
+    // The next run finds every word, and the versions draw from the alternatives written.
     run = Run(arguments + QStringList{u"--list-new"_qs});
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(run.Out, QByteArray());
-    // The alternatives written are the ones the versions draw from.
     const QString output = m_out + u"/garden.txt"_qs;
     run = Run(Article(u"Garden"_qs, u"Garden garden garden garden garden garden."_qs)
-              + QStringList{u"--level"_qs, u"Maximum"_qs, u"--text"_qs, output});
+              + Args(u"--level|Maximum|--text|"_qs + output));
     QCOMPARE(run.ExitCode, 0);
     const QString version = ReadTextFile(output);
-    const bool replaced = version.contains(u"cultivate"_qs, Qt::CaseInsensitive)
-        || version.contains(u"grow"_qs, Qt::CaseInsensitive);
-    QVERIFY2(replaced, qPrintable(version));
+    QVERIFY2(version.contains(u"cultivate"_qs, Qt::CaseInsensitive) || version.contains(u"grow"_qs, Qt::CaseInsensitive),
+             qPrintable(version));
 }
 
 void TestBatch::lookupUsesEmbeddedThesaurus()
@@ -676,8 +556,7 @@ void TestBatch::lookupUsesEmbeddedThesaurus()
     if (!QFile::exists(ThesaurusService::DefaultDataPath() + u".idx"_qs))
         QSKIP("The thesaurus data of the package mythes-en-us is not installed");
     // No SETTINGS.INI: the thesaurus built into the program answers.
-    const BatchRun run = Run(Article(u"Happy"_qs, u"Happy gardeners."_qs) + QStringList{u"--lookup"_qs,
-                                                                                         u"--list-new"_qs});
+    const BatchRun run = Run(Article(u"Happy"_qs, u"Happy gardeners."_qs) + Args(u"--lookup|--list-new"_qs));
     QCOMPARE(run.Err, QByteArray());
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(run.Out, QByteArray("Happy\ngardeners\n"));
@@ -692,8 +571,7 @@ void TestBatch::reportsWordFilesThatCannotBeWritten()
     QVERIFY(WriteTextFile(m_home + u"/SETTINGS.INI"_qs, u"[URL]\r\nThesaurusUrl="_qs + service.BaseUrl()));
     QVERIFY(WriteTextFile(m_home + u"/data"_qs, QString())); // a file where the word files should go
     const QString output = m_out + u"/version.txt"_qs;
-    const BatchRun run = Run(Article(u"Garden Tips"_qs, u"Plant flowers."_qs)
-                             + QStringList{u"--lookup"_qs, u"--text"_qs, output});
+    const BatchRun run = Run(Article(u"Garden Tips"_qs, u"Plant flowers."_qs) + Args(u"--lookup|--text|"_qs + output));
     QCOMPARE(run.ExitCode, 1);
     QCOMPARE(QString::fromUtf8(run.Err), u"verbloom-batch: The alternatives of 4 word(s) could not be saved in "
                                          "the folder \""_qs + m_home + u"/data\".\n"_qs);
@@ -706,12 +584,11 @@ void TestBatch::helpDocumentsEveryOption()
     QCOMPARE(run.ExitCode, 0);
     QCOMPARE(run.Err, QByteArray());
     const QString help = QString::fromUtf8(run.Out);
-    for (const QString &option :
-         {u"--home"_qs, u"--title"_qs, u"--contents "_qs, u"--contents-text"_qs, u"--level"_qs, u"--ignore-shorter"_qs,
-          u"--ignore "_qs, u"--lookup"_qs, u"--seed"_qs, u"--text"_qs, u"--sql"_qs, u"--table"_qs, u"--title-field"_qs,
-          u"--article-field"_qs, u"--count"_qs, u"--rss"_qs, u"--url"_qs, u"--description-chars"_qs, u"--site"_qs,
-          u"--pages"_qs, u"--links"_qs, u"--template"_qs, u"--extension"_qs, u"--force"_qs, u"--list-new"_qs,
-          u"SOURCE_DATE_EPOCH"_qs, u"Exit status"_qs})
+    const QStringList options = Args(u"--home|--title|--contents |--contents-text|--level|--ignore-shorter|--ignore |"
+                                     "--lookup|--seed|--text|--sql|--table|--title-field|--article-field|--count|--rss|"
+                                     "--url|--description-chars|--site|--pages|--links|--template|--extension|--force|"
+                                     "--list-new|SOURCE_DATE_EPOCH|Exit status"_qs);
+    for (const QString &option : options)
         QVERIFY2(help.contains(option), qPrintable(option));
 }
 

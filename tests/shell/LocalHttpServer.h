@@ -4,7 +4,6 @@
 #include <QHash>
 #include <QHostAddress>
 #include <QList>
-#include <QPointer>
 #include <QTcpServer>
 #include <QTcpSocket>
 
@@ -30,8 +29,7 @@ public:
             + QString::fromLatin1(path);
     }
 
-    int Requests = 0;                      ///< all requests, the browser's own (favicon) included
-    QHash<QByteArray, int> RequestsByPath;
+    QHash<QByteArray, int> RequestsByPath; ///< the browser's own requests (favicon) included
 
 private:
     void Accept()
@@ -48,7 +46,6 @@ private:
         request += socket->readAll();
         if (!request.contains("\r\n\r\n"))
             return;
-        ++Requests;
         const QList<QByteArray> words = request.left(request.indexOf("\r\n")).split(' ');
         const QByteArray path = words.value(1);
         ++RequestsByPath[path];

@@ -8,7 +8,9 @@
 
 #include <QDir>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMouseEvent>
+#include <QPlainTextEdit>
 #include <QTemporaryDir>
 #include <QTest>
 
@@ -25,6 +27,22 @@ inline void MoveMouseOver(QWidget *widget)
     QCoreApplication::sendEvent(widget, &move);
 }
 
+/// A message box as one line, so that a test compares the boxes shown with those it expects.
+inline QString Box(const QString &text, UiServices::Buttons buttons = UiServices::Buttons::Ok,
+                   UiServices::Icon icon = UiServices::Icon::None, const QString &title = u"Verbloom"_qs)
+{
+    return title + u": "_qs + text + u" [buttons "_qs + QString::number(int(buttons)) + u", icon "_qs
+        + QString::number(int(icon)) + u"]"_qs;
+}
+
+inline QStringList Boxes(const ScriptedUiServices &ui)
+{
+    QStringList boxes;
+    for (const UiServices::Message &message : ui.Messages)
+        boxes << Box(message.Text, message.ButtonSet, message.IconKind, message.Title);
+    return boxes;
+}
+
 /// A main window over a fresh program folder, with scripted dialogs, shown on screen.
 class MainRig
 {
@@ -33,7 +51,7 @@ public:
     {
         SetProgramFolder(Home.path());
         if (!settingsIni.isEmpty())
-            WriteBinaryFile(Home.filePath(QStringLiteral("SETTINGS.INI")), settingsIni);
+            WriteBinaryFile(Home.filePath(u"SETTINGS.INI"_qs), settingsIni);
         Main = std::make_unique<frmMain>(Ui, thesaurusHost);
         Main->show();
         QVERIFY(QTest::qWaitForWindowExposed(Main.get()));
@@ -56,10 +74,22 @@ public:
 
     void Click(const QString &labelOrImage) { QTest::mouseClick(Find<QLabel>(labelOrImage), Qt::LeftButton); }
 
+    QString Text(const QString &box) const
+    {
+        if (auto *line = Main->findChild<QLineEdit *>(box))
+            return line->text();
+        return Find<QPlainTextEdit>(box)->toPlainText();
+    }
+    void EnterArticle(const QString &title, const QString &contents)
+    {
+        Find<QLineEdit>(u"txtTitle"_qs)->setText(title);
+        Find<QPlainTextEdit>(u"txtArticle"_qs)->setPlainText(contents);
+    }
+
     void WriteWordFile(const QString &word, const QString &alternatives)
     {
-        QDir(Home.path()).mkpath(QStringLiteral("data"));
-        QVERIFY(WriteTextFile(Home.filePath(QStringLiteral("data/") + word + QStringLiteral(".dat")), alternatives));
+        QDir(Home.path()).mkpath(u"data"_qs);
+        QVERIFY(WriteTextFile(Home.filePath(u"data/"_qs + word + u".dat"_qs), alternatives));
     }
 
     QTemporaryDir Home;

@@ -15,17 +15,6 @@
 using namespace verbloom;
 using namespace verbloom::test;
 
-namespace {
-
-constexpr int SplashWaitMs = frmSplash::SplashMs + 5000;
-
-QString LabelText(QWidget *window, const QString &name)
-{
-    return window->findChild<QLabel *>(name)->text();
-}
-
-} // namespace
-
 class tst_frmSplash final : public QObject
 {
     Q_OBJECT
@@ -45,31 +34,24 @@ void tst_frmSplash::labels_data()
     QTest::addColumn<QString>("company");
     QTest::addColumn<QString>("website");
     QTest::addColumn<QString>("support");
-    const QString longName = QStringLiteral("C").repeated(100);
-    QTest::newRow("no SETTINGS.INI") << QByteArray() << QString() << QString()
-                                     << QStringLiteral("Please contact  in case of any problems.");
+    const QString noSupport = u"Please contact  in case of any problems."_qs;
+    const QString longName = u"C"_qs.repeated(100);
+    QTest::newRow("no SETTINGS.INI") << QByteArray() << QString() << QString() << noSupport;
     QTest::newRow("all keys") << QByteArray("[URL]\r\nSupportUrl = help@example.com\r\nWebSiteUrl=www.example.com\r\n"
                                             "[COMPANY]\r\nCompanyName=Example Ltd.\r\n")
-                              << QStringLiteral("Example Ltd.") << QStringLiteral("www.example.com")
-                              << QStringLiteral("Please contact help@example.com in case of any problems.");
-    QTest::newRow("sections and keys ignore case")
-        << QByteArray("[url]\nwebsiteurl=site\n[company]\ncompanyname=Name\n") << QStringLiteral("Name")
-        << QStringLiteral("site") << QStringLiteral("Please contact  in case of any problems.");
-    QTest::newRow("100 characters cut to 79") << (QByteArray("[COMPANY]\nCompanyName=") + longName.toLatin1() + '\n')
-                                              << longName.left(79) << QString()
-                                              << QStringLiteral("Please contact  in case of any problems.");
+                              << u"Example Ltd."_qs << u"www.example.com"_qs
+                              << u"Please contact help@example.com in case of any problems."_qs;
+    QTest::newRow("100 characters cut to 79") << "[COMPANY]\nCompanyName=" + longName.toLatin1() + '\n'
+                                              << longName.left(79) << QString() << noSupport;
 }
 
 void tst_frmSplash::labels()
 {
     QFETCH(QByteArray, ini);
-    QFETCH(QString, company);
-    QFETCH(QString, website);
-    QFETCH(QString, support);
     QTemporaryDir home;
     SetProgramFolder(home.path());
     if (!ini.isEmpty())
-        QVERIFY(WriteBinaryFile(home.filePath(QStringLiteral("SETTINGS.INI")), ini));
+        QVERIFY(WriteBinaryFile(home.filePath(u"SETTINGS.INI"_qs), ini));
     StopProcessing = false;
     int loads = 0;
     QWidget mainWindow;
@@ -80,15 +62,15 @@ void tst_frmSplash::labels()
     QVERIFY(StopProcessing);
     QCOMPARE(loads, 1);
     QVERIFY(!mainWindow.isVisible());
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblCompanyNM")), company);
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblWebSiteURL")), website);
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblSupport")), support);
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblInternet")),
-             QStringLiteral("Please make sure that you are connected to the internet."));
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblLoading")), QStringLiteral("Please wait, loading Verbloom ..."));
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblLogo")), QStringLiteral("Verbloom"));
-    QCOMPARE(LabelText(&splash, QStringLiteral("lblLogoShadow")), QStringLiteral("Verbloom"));
-    QCOMPARE(splash.findChild<QLabel *>(QStringLiteral("lblLogoShadow"))->palette().color(QPalette::WindowText),
+    const auto text = [&](const QString &name) { return splash.findChild<QLabel *>(name)->text(); };
+    QTEST(text(u"lblCompanyNM"_qs), "company");
+    QTEST(text(u"lblWebSiteURL"_qs), "website");
+    QTEST(text(u"lblSupport"_qs), "support");
+    QCOMPARE(text(u"lblInternet"_qs), u"Please make sure that you are connected to the internet."_qs);
+    QCOMPARE(text(u"lblLoading"_qs), u"Please wait, loading Verbloom ..."_qs);
+    QCOMPARE(text(u"lblLogo"_qs), u"Verbloom"_qs);
+    QCOMPARE(text(u"lblLogoShadow"_qs), u"Verbloom"_qs);
+    QCOMPARE(splash.findChild<QLabel *>(u"lblLogoShadow"_qs)->palette().color(QPalette::WindowText),
              QColor(0xC0, 0xC0, 0xC0));
 }
 
@@ -99,12 +81,12 @@ void tst_frmSplash::showsMainWindowAfterTimer()
     QWidget mainWindow;
     auto *splash = new frmSplash([&]() -> QWidget * { return &mainWindow; });
     QPointer<frmSplash> alive(splash);
-    auto *timer = splash->findChild<QTimer *>(QStringLiteral("Timer1"));
+    auto *timer = splash->findChild<QTimer *>(u"Timer1"_qs);
     QCOMPARE(timer->interval(), 3000);
     QVERIFY(timer->isActive());
     splash->show();
     QVERIFY(!mainWindow.isVisible());
-    QTRY_VERIFY_WITH_TIMEOUT(mainWindow.isVisible(), SplashWaitMs);
+    QTRY_VERIFY_WITH_TIMEOUT(mainWindow.isVisible(), frmSplash::SplashMs + 5000);
     QTRY_VERIFY(alive.isNull());
 }
 
@@ -114,8 +96,8 @@ void tst_frmSplash::bannerFromSettings()
     server.AddPage("/banner.html", "<html><head><title>Banner Page</title></head><body>Ad</body></html>");
     MainRig rig(QString(), "[URL]\nBANNER_URL=" + server.Url("/banner.html").toLatin1() + "\n");
     QTRY_COMPARE_WITH_TIMEOUT(rig.Main->WebBrowser1().ReadyState(), 4, 20000);
-    QCOMPARE(rig.Main->WebBrowser1().LocationName(), QStringLiteral("Banner Page"));
-    QCOMPARE(rig.Main->WebBrowser1().View()->parentWidget()->objectName(), QStringLiteral("Picture3"));
+    QCOMPARE(rig.Main->WebBrowser1().LocationName(), u"Banner Page"_qs);
+    QCOMPARE(rig.Main->WebBrowser1().View()->parentWidget()->objectName(), u"Picture3"_qs);
 }
 
 void tst_frmSplash::splitterMessageBox_data()
@@ -132,17 +114,13 @@ void tst_frmSplash::splitterMessageBox()
 {
     QFETCH(bool, designMode);
     QFETCH(UiServices::Answer, answer);
-    QFETCH(SplitterAnswer, expected);
     ScriptedUiServices ui;
     ui.NextAnswers = {answer};
     SplitterMessageBox box(ui);
-    const QString prompt = QStringLiteral("Accessing Routine: 'Token'\r\nIndex Out Of Range: -1\r\n");
-    QCOMPARE(box.ShowSplitterMessage(prompt, designMode), expected);
-    QCOMPARE(ui.Messages.size(), 1);
-    QCOMPARE(ui.Messages[0].Text, prompt);
-    QCOMPARE(ui.Messages[0].Title, QStringLiteral("clsSplitExtra Message"));
-    QCOMPARE(ui.Messages[0].IconKind, UiServices::Icon::Exclamation);
-    QCOMPARE(ui.Messages[0].ButtonSet, designMode ? UiServices::Buttons::YesNo : UiServices::Buttons::Ok);
+    const QString prompt = u"Accessing Routine: 'Token'\r\nIndex Out Of Range: -1\r\n"_qs;
+    QTEST(box.ShowSplitterMessage(prompt, designMode), "expected");
+    const auto buttons = designMode ? UiServices::Buttons::YesNo : UiServices::Buttons::Ok;
+    QCOMPARE(Boxes(ui), QStringList{Box(prompt, buttons, UiServices::Icon::Exclamation, u"clsSplitExtra Message"_qs)});
     QCOMPARE(ui.Messages[0].DefaultButton, designMode ? UiServices::Answer::No : UiServices::Answer::Ok);
 }
 
