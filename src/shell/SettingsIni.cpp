@@ -1,6 +1,5 @@
 #include "SettingsIni.h"
 
-#include "common/IniFile.h"
 #include "common/ProgramFolder.h"
 
 namespace verbloom {
@@ -8,11 +7,6 @@ namespace verbloom {
 QString SettingsIniPath()
 {
     return ProgramPath(u"SETTINGS.INI"_qs);
-}
-
-QString ReadSetting(const QString &iniFile, const QString &section, const QString &key)
-{
-    return ReadIniValue(section, key, iniFile).left(MaxSettingLength);
 }
 
 } // namespace verbloom

@@ -4,6 +4,7 @@
 #include "BrowserPageSource.h"
 #include "ImageCommand.h"
 #include "SettingsIni.h"
+#include "common/IniFile.h"
 #include "UiServices.h"
 #include "WebEngineBrowser.h"
 #include "frmOpenURL.h"
@@ -404,7 +405,7 @@ void frmMain::Form_Load()
     lblConfiguration->setVisible(false);
     SetButton(false);
 
-    const QString bannerUrl = ReadSetting(SettingsIniPath(), u"URL"_qs, u"BANNER_URL"_qs);
+    const QString bannerUrl = ReadIniValue(u"URL"_qs, u"BANNER_URL"_qs, SettingsIniPath());
     if (bannerUrl.isEmpty())
         m_banner->ShowHtml(BannerHtml());
     else

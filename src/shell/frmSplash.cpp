@@ -1,6 +1,7 @@
 #include "frmSplash.h"
 
 #include "SettingsIni.h"
+#include "common/IniFile.h"
 #include "shell/ArticleModel.h"
 
 #include <QCoreApplication>
@@ -101,10 +102,10 @@ void frmSplash::Form_Load()
 {
     StopProcessing = true;
     const QString ini = SettingsIniPath();
-    lblSupport->setText(u"Please contact "_qs + ReadSetting(ini, u"URL"_qs, u"SupportUrl"_qs)
+    lblSupport->setText(u"Please contact "_qs + ReadIniValue(u"URL"_qs, u"SupportUrl"_qs, ini)
                         + u" in case of any problems."_qs);
-    lblCompanyNM->setText(ReadSetting(ini, u"COMPANY"_qs, u"CompanyName"_qs));
-    lblWebSiteURL->setText(ReadSetting(ini, u"URL"_qs, u"WebSiteUrl"_qs));
+    lblCompanyNM->setText(ReadIniValue(u"COMPANY"_qs, u"CompanyName"_qs, ini));
+    lblWebSiteURL->setText(ReadIniValue(u"URL"_qs, u"WebSiteUrl"_qs, ini));
     if (m_loadMainWindow)
         m_mainWindow = m_loadMainWindow();
     QCoreApplication::processEvents();

@@ -41,8 +41,8 @@ void tst_frmSplash::labels_data()
                                             "[COMPANY]\r\nCompanyName=Example Ltd.\r\n")
                               << u"Example Ltd."_qs << u"www.example.com"_qs
                               << u"Please contact help@example.com in case of any problems."_qs;
-    QTest::newRow("100 characters cut to 79") << "[COMPANY]\nCompanyName=" + longName.toLatin1() + '\n'
-                                              << longName.left(79) << QString() << noSupport;
+    QTest::newRow("100 characters shown whole") << "[COMPANY]\nCompanyName=" + longName.toLatin1() + '\n'
+                                                << longName << QString() << noSupport;
 }
 
 void tst_frmSplash::labels()
