@@ -89,6 +89,12 @@ void ImageCommand::SetSkin(const QString &key)
     m_image->setPixmap(ImageList::Skins().Picture(key));
 }
 
+void ImageCommand::SetToolTip(const QString &text)
+{
+    m_label->setToolTip(text);
+    m_image->setToolTip(text);
+}
+
 void ImageCommand::SetCaption(const QString &caption)
 {
     m_label->setText(caption);

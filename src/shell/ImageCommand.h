@@ -41,6 +41,8 @@ public:
     QString Skin() const { return m_skin; }
 
     void SetCaption(const QString &caption);
+    /// The same tool tip on the caption and the image.
+    void SetToolTip(const QString &text);
     QString Caption() const;
 
 signals:

@@ -258,13 +258,8 @@ QWidget *frmMain::BuildArticlePanel()
                               &frmMain::cmdBrowseURL_Click);
     cmdBrowseTextFile = AddCommand(u"cmdBrowseTextFile"_qs, u"imgBrowseFile"_qs, u"     Browse File"_qs,
                                    Picture1, &frmMain::cmdBrowseTextFile_Click);
-    const QString websiteTip = u"Load contents from a website. You will have to enter the URL here."_qs;
-    const QString fileTip = u"Load contents from a text file from your PC"_qs;
-    for (QWidget *part : {static_cast<QWidget *>(cmdBrowseURL->Label()), static_cast<QWidget *>(cmdBrowseURL->Image())})
-        part->setToolTip(websiteTip);
-    for (QWidget *part : {static_cast<QWidget *>(cmdBrowseTextFile->Label()),
-                          static_cast<QWidget *>(cmdBrowseTextFile->Image())})
-        part->setToolTip(fileTip);
+    cmdBrowseURL->SetToolTip(u"Load contents from a website. You will have to enter the URL here."_qs);
+    cmdBrowseTextFile->SetToolTip(u"Load contents from a text file from your PC"_qs);
 
     auto *layout = new QGridLayout(Picture1);
     layout->setContentsMargins(18, 16, 18, 16);
