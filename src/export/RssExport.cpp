@@ -154,12 +154,14 @@ ExportResult ExportRss(const RssExportOptions &options, ArticleBoxes &boxes, Ver
     QString lastTitle;
     QString channelTitle;
     bool spoolOk = true;
+    // An iteration whose title or contents is empty does nothing, the boxes included, so every
+    // later one does nothing either.
     for (qsizetype k = 1; k <= *count; ++k) {
-        if (!boxes.Title.isEmpty() && !boxes.Contents.isEmpty()) {
-            spoolOk = spoolOk && rows.Append(boxes.Title, RssDescription(boxes.Contents, limit));
-            channelTitle = lastTitle;
-            lastTitle = boxes.Title;
-        }
+        if (boxes.Title.isEmpty() || boxes.Contents.isEmpty())
+            break;
+        spoolOk = spoolOk && rows.Append(boxes.Title, RssDescription(boxes.Contents, limit));
+        channelTitle = lastTitle;
+        lastTitle = boxes.Title;
         AdvanceBoxes(boxes, source);
     }
 

@@ -48,11 +48,12 @@ QString RssItem(const QString &title, const QString &url, const QString &descrip
 
 /// cmdSave_Click without the window. XmlFileName is the trimmed file name; then ValidateXmlForm;
 /// a count of 0 or less does nothing (NothingToDo, no message); a count above 32767 and a
-/// file name of blanks are refused. FillArticleList then makes one row per version whose title
-/// and contents are both non-empty (count versions in all, the first from the boxes as they
-/// stand), and the feed is streamed into the file, which appears whole only when complete. The
-/// channel title is the title of the next-to-last row. The last message asks whether to open
-/// the file; the window closes whatever the answer.
+/// file name of blanks are refused. FillArticleList then makes count rows, the first from the
+/// boxes as they stand, the boxes receiving the next version after each row; once the title or
+/// the contents is empty nothing more happens (no row, the boxes unchanged). The feed is
+/// streamed into the file, which appears whole only when complete. The channel title is the
+/// title of the next-to-last row. The last message asks whether to open the file; the window
+/// closes whatever the answer.
 ExportResult ExportRss(const RssExportOptions &options, ArticleBoxes &boxes, VersionSource &source,
                        const Clock &clock = &QDateTime::currentDateTime,
                        QChar decimalPoint = QLatin1Char('.'));

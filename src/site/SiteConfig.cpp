@@ -208,7 +208,7 @@ std::optional<UserMessage> ValidateOptions(const SiteOptions &options, QChar dec
     if (!IsNumeric(options.NoOfPages, decimalPoint))
         return InformationMessage(QStringLiteral("Number of pages to generate should be numeric"));
     const std::optional<qint16> pages = TextToInt16(options.NoOfPages, decimalPoint);
-    if (!pages || *pages < 0)
+    if (!pages)
         return InformationMessage(QStringLiteral("Number of pages to generate should be between 0 and 32767"));
     return std::nullopt;
 }

@@ -85,8 +85,9 @@ UserMessage SaveContents(const QString &programFolder, const SiteOptions &option
                          QChar decimalPoint = QLatin1Char('.'));
 
 /// ValidateOptions: the first failing check as an OK message titled "Message", or nothing.
-/// Numbers are read with the user's decimal point. The number of pages must also convert to
-/// 0..32767, so a run never starts with a count it cannot make.
+/// Numbers are read with the user's decimal point. The number of pages must also fit 16 bits
+/// (nearest, halves to even), so a run never starts with a count it cannot make; a count below 0
+/// makes no pages, as 0 does.
 std::optional<UserMessage> ValidateOptions(const SiteOptions &options,
                                            QChar decimalPoint = QLatin1Char('.'));
 

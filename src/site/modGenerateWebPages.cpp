@@ -162,8 +162,9 @@ UserMessage WebPagesQuestion(const SiteOptions &options)
 SiteRunResult GenerateWebSite(const QString &programFolder, const SiteOptions &options, ArticleBoxes &boxes,
                               VersionSource &source, QChar decimalPoint)
 {
+    // A count below 0 makes no pages, as 0 does; only one outside 16 bits is refused.
     const std::optional<qint16> pages = TextToInt16(options.NoOfPages, decimalPoint);
-    if (!pages || *pages < 0)
+    if (!pages)
         return Refusal(QStringLiteral("Number of pages to generate should be between 0 and 32767"));
     bool tooLong = false;
     QString caption = CleanFileName(options.NavigationLinkName, options.ReplaceChar, &tooLong);

