@@ -297,9 +297,9 @@ bool clsSplitExtra::SaveTokenArrayToFile(const QString &rStFile)
 
 bool clsSplitExtra::SaveSortedTokenArrayToFile(const QString &rStFile)
 {
-    // Nothing to index without tokens: the listing then holds only its first line.
-    if (!m_TokenList.isEmpty())
-        EnsureIndex();
+    // Without tokens the index reports "No tokens to index." and the listing holds only its
+    // first line.
+    EnsureIndex();
     return WriteListing(u"SaveSortedTokenArrayToFile"_qs, rStFile,
                         u"Sorted Index - Total Tokens: "_qs, &m_SortIndex);
 }

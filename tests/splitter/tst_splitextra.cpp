@@ -67,6 +67,15 @@ void TestSplitExtra::split_data()
     QTest::newRow("mixed kinds") << u" |.|\r\n|--"_qs << Kinds{0, 4, 1, 2}
                                  << u"Hello world. Bye--now\r\nend"_qs
                                  << u"Hello|world|.|Bye|--now\r\n|end"_qs;
+    QTest::newRow("comma and blank") << u",| "_qs << Kinds{4, 4} << u"a, b"_qs << u"a|,| |b"_qs;
+    QTest::newRow("token first") << u","_qs << Kinds{4} << u",a"_qs << u",|a"_qs;
+    QTest::newRow("token last") << u","_qs << Kinds{4} << u"a,"_qs << u"a|,"_qs;
+    QTest::newRow("lead last") << u","_qs << Kinds{2} << u"a,"_qs << u"a|,"_qs;
+    QTest::newRow("trail first") << u","_qs << Kinds{1} << u",a"_qs << u"a"_qs;
+    QTest::newRow("whole multi-character match") << u"--"_qs << Kinds{0} << u"a--b-c"_qs
+                                                 << u"a|b-c"_qs;
+    QTest::newRow("blank at the very end") << u" |."_qs << Kinds{4, 4} << u"Hello world. "_qs
+                                           << u"Hello| |world|.| "_qs;
     QTest::newRow("exact case") << u"X"_qs << Kinds{4} << u"axbXc"_qs << u"axb|X|c"_qs;
     // Matches 16 characters after the search start and far beyond it.
     const QString x = QString(16, u'x'), y = QString(16, u'y'), z = QString(40, u'z');
