@@ -68,10 +68,12 @@ void FitCaption(ImageCommand *command)
 }
 
 // A white panel of the window; mouse moves over it count as moves over the background.
-QFrame *Card(const QString &name, QWidget *parent)
+QFrame *Card(const QString &name, QWidget *parent, QObject *filter)
 {
     auto *card = new QFrame(parent);
     card->setObjectName(name);
+    card->setMouseTracking(true);
+    card->installEventFilter(filter);
     return card;
 }
 
@@ -142,8 +144,8 @@ void frmSuggestions::BuildWindow()
     SSTab1->addTab(BuildList(1), QStringLiteral("Contents"));
     lblTotal = Caption(TotalCaption(0), Picture1, QStringLiteral("lblTotal"));
 
-    auto *words = Card(QStringLiteral("fraWords"), Picture1);
-    auto *left = new QVBoxLayout(words);
+    fraWords = Card(QStringLiteral("fraWords"), Picture1, this);
+    auto *left = new QVBoxLayout(fraWords);
     left->setContentsMargins(14, 12, 14, 12);
     left->setSpacing(8);
     left->addWidget(Caption(QStringLiteral("Select a word here"), Picture1, QStringLiteral("lblSelectWord")));
@@ -178,8 +180,8 @@ void frmSuggestions::BuildWindow()
     lookupRow->addStretch(1);
     lookupRow->addWidget(lblOpenSite);
 
-    auto *alternatives = Card(QStringLiteral("fraAlternatives"), Picture1);
-    auto *right = new QVBoxLayout(alternatives);
+    fraAlternatives = Card(QStringLiteral("fraAlternatives"), Picture1, this);
+    auto *right = new QVBoxLayout(fraAlternatives);
     right->setContentsMargins(16, 12, 16, 14);
     right->setSpacing(8);
     right->addWidget(lblMessage);
@@ -229,8 +231,8 @@ void frmSuggestions::BuildWindow()
     grid->setHorizontalSpacing(14);
     grid->setVerticalSpacing(12);
     grid->addWidget(lblHeading, 0, 0, 1, 2);
-    grid->addWidget(words, 1, 0);
-    grid->addWidget(alternatives, 1, 1);
+    grid->addWidget(fraWords, 1, 0);
+    grid->addWidget(fraAlternatives, 1, 1);
     grid->addWidget(pctStatus, 2, 0, 1, 2);
     grid->addLayout(commands, 3, 0, 1, 2);
     grid->setColumnStretch(0, 5);
@@ -407,7 +409,12 @@ void frmSuggestions::TakeConfirmedChoice(const QString &list, const QString &ite
 {
     lblList->setText(list);
     lblItem->setText(item);
-    SetSuggestionsText(alternatives);
+    // The box may already show this text for another row; the choice still belongs to this one.
+    // An empty choice over an empty box leaves the row as it is.
+    if (txtSuggestions->toPlainText() == alternatives && !alternatives.isEmpty())
+        txtSuggestions_Change();
+    else
+        SetSuggestionsText(alternatives);
 }
 
 void frmSuggestions::CheckManual()
@@ -589,7 +596,8 @@ void frmSuggestions::ResetSkins()
 
 bool frmSuggestions::eventFilter(QObject *watched, QEvent *event)
 {
-    if (watched == Picture1 && event->type() == QEvent::MouseMove) {
+    if ((watched == Picture1 || watched == fraWords || watched == fraAlternatives)
+        && event->type() == QEvent::MouseMove) {
         ResetSkins();
     } else if (watched == lstSuggestions[0] || watched == lstSuggestions[1]) {
         if (event->type() == QEvent::KeyPress)

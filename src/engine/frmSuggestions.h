@@ -94,6 +94,8 @@ private:
     bool m_lastSaveFailed = false;
 
     QWidget *Picture1 = nullptr;
+    QWidget *fraWords = nullptr;        ///< panels on the background, hovered as the background
+    QWidget *fraAlternatives = nullptr;
     QLabel *lblHeading = nullptr;
     QTabWidget *SSTab1 = nullptr;
     QTableView *lstSuggestions[2] = {nullptr, nullptr};

@@ -146,24 +146,31 @@ bool FillWordLists(const QString &title, const QString &contents, ArticleTokens 
         view.AddItems(titleTokens.at(i), 0);
     }
 
+    // The way back after Cancel: the wizard returns to its entry state.
+    const auto cancel = [&view, &host] {
+        view.SetStatusVisible(false);
+        view.Unload();
+        host.cmdNext_Click();
+        host.SetButton(false);
+        host.UnloadWaitWindow();
+        host.ShowMainWindow();
+        return false;
+    };
+
     const qsizetype m = contentsTokens.size() - 1;
     view.SetProgressMaximum(std::max<qsizetype>(m, 0));
     for (qsizetype i = 0; i <= m; ++i) {
-        if (StopProcessing) {
-            view.SetStatusVisible(false);
-            view.Unload();
-            host.cmdNext_Click();
-            host.SetButton(false);
-            host.UnloadWaitWindow();
-            host.ShowMainWindow();
-            return false;
-        }
+        if (StopProcessing)
+            return cancel();
         view.SelectContentsTab();
         view.ShowModeless();
         view.SetProgressValue(i);
         view.SetWordCaption(contentsTokens.at(i));
         view.AddItems(contentsTokens.at(i), 1);
     }
+    // A Cancel during the last token has hidden the main window too: take the way back.
+    if (StopProcessing)
+        return cancel();
 
     view.SetWordCaption(kEnterAlternatesCaption.toString());
     view.SetStatusVisible(false);

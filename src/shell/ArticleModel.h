@@ -68,7 +68,8 @@ public:
 /// Caption of lblWord when every token has been handed on.
 inline constexpr QStringView kEnterAlternatesCaption = u"Please enter alternate words.";
 
-/// Splits title and contents into `model`, then hands every token on; returns false when cancelled.
+/// Splits title and contents into `model`, then hands every token on; returns false when cancelled
+/// (StopProcessing found set before a contents token or after the last one).
 bool FillWordLists(const QString &title, const QString &contents, ArticleTokens &model,
                    SuggestionsView &view, WizardHost &host);
 

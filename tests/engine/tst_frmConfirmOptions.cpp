@@ -67,6 +67,7 @@ private slots:
     void saveSelectedComposesChoice();
     void ignoreAndCloseBoxWriteNothing_data();
     void ignoreAndCloseBoxWriteNothing();
+    void choiceEqualToShownTextReachesItsRow();
     void doNotPromptAgainChecksManual();
     void doNotPromptAgainStopsFurtherOffers();
     void hoverSkins_data();
@@ -186,6 +187,26 @@ void tst_frmConfirmOptions::ignoreAndCloseBoxWriteNothing()
     QCOMPARE(rig.Window->Lists().Row(0, 0).Alternatives, u"old, stuff"_qs);
     QCOMPARE(rig.Suggestions()->toPlainText(), u"old, stuff"_qs);
     QVERIFY(rig.Ui.Messages.isEmpty());
+}
+
+void tst_frmConfirmOptions::choiceEqualToShownTextReachesItsRow()
+{
+    // While "merry" is looked up the user selects "glad", whose alternatives are then shown; the
+    // choice for "merry" is the same text and must still reach the row of "merry".
+    SuggestionsRig rig({{u"glad"_qs, u"jolly"_qs}});
+    rig.Host.Page.Pages.insert(SearchUrl(u"merry"_qs), MeaningsPage({{u"merry"_qs, u"jolly"_qs}}));
+    rig.Host.Page.OnWait = [&] { QVERIFY(rig.ClickRow(1, 1)); };
+    int seen = 0;
+    WhenConfirmShown(
+        [](frmConfirmOptions &window) {
+            QTest::keyClicks(window.findChild<QLineEdit *>(u"txtCustom"_qs), u"jolly"_qs);
+            ClickPart(window, u"cmdSuggestionOk"_qs);
+        },
+        &seen);
+    QVERIFY(rig.Analyse(u"a "_qs, u"glad merry "_qs));
+    QCOMPARE(seen, 1);
+    QCOMPARE(rig.Window->Lists().Row(1, 2).Alternatives, u"jolly"_qs);
+    QCOMPARE(rig.LabelText(u"lblItem"_qs), u"3"_qs);
 }
 
 void tst_frmConfirmOptions::doNotPromptAgainChecksManual()

@@ -40,6 +40,7 @@ private slots:
     void selectingRowTellsWhetherWordTakesAlternatives_data();
     void selectingRowTellsWhetherWordTakesAlternatives();
     void arrowKeysSelectAsClicksDo();
+    void doubleClickHasNoEffect();
     void editsReachWordFilesOnlyThroughSaveData();
     void sampleShowsPartOfShownTab_data();
     void sampleShowsPartOfShownTab();
@@ -161,6 +162,25 @@ void tst_frmSuggestions::arrowKeysSelectAsClicksDo()
     QCOMPARE(rig.LabelText(u"lblActiveWord"_qs), u"days"_qs);
     QCOMPARE(rig.Suggestions()->toPlainText(), u"times"_qs);
     QCOMPARE(rig.LabelText(u"lblMessage"_qs), kEnterAlternatives);
+}
+
+void tst_frmSuggestions::doubleClickHasNoEffect()
+{
+    SuggestionsRig rig({{u"sunny"_qs, u"bright"_qs}});
+    QVERIFY(rig.Analyse(u"a "_qs, u"Sunny days "_qs));
+    QVERIFY(rig.ClickRow(1, 1)); // the first click of the double click selects and saves
+    // A save would write the row back over this.
+    QVERIFY(WriteTextFile(rig.WordFile(u"sunny"_qs), u"changed"_qs));
+
+    QTableView *view = rig.List(1);
+    const QPoint at = view->visualRect(view->model()->index(0, 0)).center();
+    QTest::mousePress(view->viewport(), Qt::LeftButton, {}, at);
+    QTest::mouseDClick(view->viewport(), Qt::LeftButton, {}, at);
+    QTest::mouseRelease(view->viewport(), Qt::LeftButton, {}, at);
+    QCOMPARE(ReadTextFile(rig.WordFile(u"sunny"_qs)), u"changed"_qs);
+
+    QVERIFY(rig.ClickRow(1, 1)); // a later click selects again
+    QCOMPARE(ReadTextFile(rig.WordFile(u"sunny"_qs)), u"bright"_qs);
 }
 
 void tst_frmSuggestions::editsReachWordFilesOnlyThroughSaveData()
@@ -312,29 +332,33 @@ void tst_frmSuggestions::closingStepsInOrder()
 
 void tst_frmSuggestions::cancelReturnsToEntryState_data()
 {
-    QTest::addColumn<bool>("duringAnalysis");
-    QTest::newRow("during the analysis") << true;
-    QTest::newRow("after the analysis") << false;
+    QTest::addColumn<QString>("contents");
+    QTest::addColumn<int>("cancelAtLookup"); // Cancel during this lookup (from 1); 0: after the analysis
+    QTest::addColumn<int>("rows");           // contents rows at the end
+    QTest::addColumn<int>("lookups");
+
+    QTest::newRow("during the analysis") << u"Alpha Beta Gamma "_qs << 1 << 1 << 1;
+    QTest::newRow("during the last token") << u"Alpha Beta Gamma"_qs << 3 << 5 << 3;
+    // Nothing more is looked up once Cancel was pressed (the stem of "Alpha" has no suffix).
+    QTest::newRow("after the analysis") << u"Alpha Beta Gamma "_qs << 0 << 6 << 3;
 }
 
 void tst_frmSuggestions::cancelReturnsToEntryState()
 {
-    QFETCH(bool, duringAnalysis);
+    QFETCH(QString, contents);
+    QFETCH(int, cancelAtLookup);
+    QFETCH(int, rows);
+    QFETCH(int, lookups);
 
     SuggestionsRig rig;
-    bool cancelled = false;
-    if (duringAnalysis) {
-        // Cancel is pressed while the first contents word is being looked up.
-        rig.Host.Page.OnWait = [&] {
-            if (!cancelled) {
-                cancelled = true;
-                rig.Click(u"cmdCancel"_qs);
-            }
-        };
-    }
-    const bool completed = rig.Analyse(u"a "_qs, u"Alpha Beta Gamma "_qs);
-    QCOMPARE(completed, !duringAnalysis);
-    if (!duringAnalysis) {
+    int waits = 0;
+    rig.Host.Page.OnWait = [&] {
+        if (++waits == cancelAtLookup)
+            rig.Click(u"cmdCancel"_qs);
+    };
+    const bool completed = rig.Analyse(u"a "_qs, contents);
+    QCOMPARE(completed, cancelAtLookup == 0);
+    if (cancelAtLookup == 0) {
         rig.Host.Calls.clear();
         rig.Click(u"imgcmdCancel"_qs);
     }
@@ -345,10 +369,8 @@ void tst_frmSuggestions::cancelReturnsToEntryState()
     QCOMPARE(rig.Host.Calls, kClosingSteps + wayBack);
     QVERIFY(!rig.Window->isVisible());
     QVERIFY(!rig.Find<QWidget>(u"pctStatus"_qs)->isVisibleTo(rig.Window.get()));
-    // During the analysis no row follows the one whose lookup was running.
-    QCOMPARE(rig.Window->Lists().Count(1), duringAnalysis ? 1 : 6);
-    // Nothing more is looked up once Cancel was pressed (the stem of "Alpha" has no suffix).
-    QCOMPARE(rig.Host.Page.Log.filter(u"navigate "_qs).size(), duringAnalysis ? 1 : 3);
+    QCOMPARE(rig.Window->Lists().Count(1), rows);
+    QCOMPARE(rig.Host.Page.Log.filter(u"navigate "_qs).size(), lookups);
 }
 
 void tst_frmSuggestions::newAnalysisForgetsOldSelection()
@@ -384,19 +406,21 @@ void tst_frmSuggestions::hoverSkins_data()
 {
     QTest::addColumn<QString>("part");
     QTest::addColumn<QString>("image");
+    QTest::addColumn<QString>("background"); // where the mouse goes last: the window or a panel on it
 
-    QTest::newRow("Get Suggenstion caption") << u"lblOpenSite"_qs << u"imglblOpenSite"_qs;
-    QTest::newRow("Get Suggenstion image") << u"imglblOpenSite"_qs << u"imglblOpenSite"_qs;
-    QTest::newRow("Ok caption") << u"cmdOk"_qs << u"imgCmdOk"_qs;
-    QTest::newRow("Ok image") << u"imgCmdOk"_qs << u"imgCmdOk"_qs;
-    QTest::newRow("Cancel caption") << u"cmdCancel"_qs << u"imgcmdCancel"_qs;
-    QTest::newRow("Cancel image") << u"imgcmdCancel"_qs << u"imgcmdCancel"_qs;
+    QTest::newRow("Get Suggenstion caption") << u"lblOpenSite"_qs << u"imglblOpenSite"_qs << u"fraAlternatives"_qs;
+    QTest::newRow("Get Suggenstion image") << u"imglblOpenSite"_qs << u"imglblOpenSite"_qs << u"Picture1"_qs;
+    QTest::newRow("Ok caption") << u"cmdOk"_qs << u"imgCmdOk"_qs << u"fraWords"_qs;
+    QTest::newRow("Ok image") << u"imgCmdOk"_qs << u"imgCmdOk"_qs << u"Picture1"_qs;
+    QTest::newRow("Cancel caption") << u"cmdCancel"_qs << u"imgcmdCancel"_qs << u"Picture1"_qs;
+    QTest::newRow("Cancel image") << u"imgcmdCancel"_qs << u"imgcmdCancel"_qs << u"fraAlternatives"_qs;
 }
 
 void tst_frmSuggestions::hoverSkins()
 {
     QFETCH(QString, part);
     QFETCH(QString, image);
+    QFETCH(QString, background);
 
     SuggestionsRig rig;
     rig.Window->show();
@@ -414,7 +438,7 @@ void tst_frmSuggestions::hoverSkins()
     QCOMPARE(skin(image), u"pic2"_qs);
     QCOMPARE(skin(other), u"pic2"_qs);
 
-    MoveMouseOver(rig.Find<QWidget>(u"Picture1"_qs));
+    MoveMouseOver(rig.Find<QWidget>(background));
     for (const QString &name : images)
         QCOMPARE(skin(name), u"pic1"_qs);
 }

@@ -183,6 +183,7 @@ void TestArticleModel::fillWordLists_data()
     QTest::newRow("one-token title") << u"Hi"_qs << u"a b"_qs << -1 << QString() << qsizetype(-1);
     QTest::newRow("cancel in the title loop") << u"Hi there "_qs << u"a b "_qs << 0 << u"Hi"_qs << qsizetype(0);
     QTest::newRow("cancel in the contents loop") << u"T "_qs << u"a\nb c "_qs << 1 << u"\n"_qs << qsizetype(2);
+    QTest::newRow("cancel at the last contents token") << u"T "_qs << u"a b."_qs << 1 << u"."_qs << qsizetype(4);
 }
 
 void TestArticleModel::fillWordLists()
