@@ -97,6 +97,8 @@ QString QtUiServices::GetSaveFileName(QWidget *parent, const FileDialog &dialog)
 {
     QFileDialog box(parent, dialog.Title, dialog.Directory, dialog.Filter);
     box.setAcceptMode(QFileDialog::AcceptSave);
+    // The program's saves replace an existing file of the chosen name without a question.
+    box.setOption(QFileDialog::DontConfirmOverwrite);
     box.setDefaultSuffix(dialog.DefaultSuffix);
     if (!dialog.FileName.isEmpty())
         box.selectFile(dialog.FileName);

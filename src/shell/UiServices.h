@@ -40,6 +40,7 @@ public:
     virtual Answer ShowMessage(QWidget *parent, const Message &message) = 0;
     /// The chosen file; empty when cancelled.
     virtual QString GetOpenFileName(QWidget *parent, const FileDialog &dialog) = 0;
+    /// The file to save; an existing file is chosen without a question about replacing it.
     virtual QString GetSaveFileName(QWidget *parent, const FileDialog &dialog) = 0;
     /// The chosen folder; empty when cancelled.
     virtual QString GetExistingDirectory(QWidget *parent, const QString &title, const QString &start) = 0;

@@ -12,6 +12,8 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QFile>
+#include <QFileDialog>
+#include <QMessageBox>
 #include <QPushButton>
 #include <QTimer>
 #include <QTreeWidget>
@@ -30,6 +32,7 @@ const QStringList OutputControls = {u"cmdVerifyTryAgain"_qs, u"imgReGenerate"_qs
                                     u"cmdSave"_qs,           u"imgSaveContents"_qs, u"cmdGenerateSite"_qs,
                                     u"imgGenerateSite"_qs};
 
+const QString TextFilter = u"*.txt Text Files (*.txt);;*.* All Files (*)"_qs;
 const QString Normal = u"button_blue"_qs;
 const QString Hover = u"button_blue_hover"_qs;
 
@@ -55,6 +58,7 @@ private slots:
     void cancelDuringAnalysis();
     void saveContents_data();
     void saveContents();
+    void saveDialogReplacesWithoutAsking();
     void browseTextFile_data();
     void browseTextFile();
     void helpAndCommand1();
@@ -345,9 +349,43 @@ void tst_frmMain::saveContents()
     QCOMPARE(QDir(rig.Home.path()).entryList(QDir::Files), QStringList{u"saved.txt"_qs});
     QCOMPARE(rig.Ui.FileDialogs.size(), 1);
     QCOMPARE(rig.Ui.FileDialogs[0].Title, u"Save this content"_qs);
+    QCOMPARE(rig.Ui.FileDialogs[0].Filter, TextFilter);
     QCOMPARE(rig.Ui.FileDialogs[0].DefaultSuffix, u"txt"_qs);
     QCOMPARE(Boxes(rig.Ui), boxes.replaceInStrings(u"PATH"_qs, path));
     QCOMPARE(rig.Ui.Opened, open ? QStringList{path} : QStringList());
+}
+
+void tst_frmMain::saveDialogReplacesWithoutAsking()
+{
+    // The real save dialog: accepting an existing file returns it at once, with no question.
+    QTemporaryDir dir;
+    const QString existing = dir.filePath(u"older.txt"_qs);
+    QVERIFY(WriteTextFile(existing, u"older"_qs));
+    bool asked = false;
+    QTimer driver;
+    connect(&driver, &QTimer::timeout, this, [&] {
+        QWidget *modal = QApplication::activeModalWidget();
+        if (auto *question = qobject_cast<QMessageBox *>(modal)) {
+            asked = true;
+            question->done(QMessageBox::No);
+        } else if (auto *dialog = qobject_cast<QFileDialog *>(modal)) {
+            if (asked)
+                dialog->reject();
+            else // queued, so that a question it may ask leaves this timer free to answer it
+                QMetaObject::invokeMethod(dialog, [dialog] { static_cast<QDialog *>(dialog)->accept(); },
+                                          Qt::QueuedConnection);
+        }
+    });
+    driver.start(20);
+    QtUiServices ui;
+    UiServices::FileDialog request;
+    request.Title = u"Save this content"_qs;
+    request.Filter = TextFilter;
+    request.DefaultSuffix = u"txt"_qs;
+    request.FileName = existing;
+    const QString chosen = ui.GetSaveFileName(nullptr, request);
+    QVERIFY(!asked);
+    QCOMPARE(chosen, existing);
 }
 
 void tst_frmMain::browseTextFile_data()
@@ -374,6 +412,7 @@ void tst_frmMain::browseTextFile()
     rig.Click(u"imgBrowseFile"_qs);
     QCOMPARE(rig.Ui.FileDialogs.size(), 1);
     QCOMPARE(rig.Ui.FileDialogs[0].Title, u"Select a text file to open"_qs);
+    QCOMPARE(rig.Ui.FileDialogs[0].Filter, TextFilter);
     QTEST(rig.Text(u"txtArticle"_qs), "expected");
     QCOMPARE(rig.Text(u"txtTitle"_qs), u"Typed title"_qs);
 }
