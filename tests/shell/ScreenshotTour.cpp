@@ -2,6 +2,7 @@
 // folder as argument. Not a test; it walks the real windows through their states.
 #include "common/ProgramFolder.h"
 #include "common/TextFile.h"
+#include "engine/frmConfirmOptions.h"
 #include "engine/frmSuggestions.h"
 #include "shell/AppStyle.h"
 #include "shell/UiServices.h"
@@ -19,6 +20,7 @@
 #include <QScreen>
 #include <QTemporaryDir>
 #include <QTimer>
+#include <QTreeWidget>
 
 #include <functional>
 #include <memory>
@@ -136,8 +138,30 @@ int main(int argc, char *argv[])
     tour.Then(100, [&] {
         mainWindow->cmdArticle_Click();
         mainWindow->cmbCustomizationLevel->setCurrentIndex(0); // "Maximum": a version that shows it
-        mainWindow->Suggestions().findChild<QCheckBox *>(QStringLiteral("chkDontPrompt"))->setChecked(true);
+        frmSuggestions &suggestions = mainWindow->Suggestions();
+        // The first word without a word file offers its meanings: photograph the window then, tick
+        // the first meaning, and let later lookups take their last meaning without asking.
+        QTimer::singleShot(2500, [&] {
+            auto *confirm = qobject_cast<frmConfirmOptions *>(QApplication::activeModalWidget());
+            if (!confirm)
+                return;
+            suggestions.move(0, 0);
+            confirm->move(120, 90);
+            Save(&suggestions, out + QStringLiteral("/suggestions-during-analysis.png"));
+            Save(confirm, out + QStringLiteral("/confirm-meaning.png"));
+            auto *meanings = confirm->findChild<QTreeWidget *>(QStringLiteral("lstSuggestionsFromWeb"));
+            if (meanings && meanings->topLevelItemCount() > 0)
+                meanings->topLevelItem(0)->setCheckState(0, Qt::Checked);
+            suggestions.findChild<QCheckBox *>(QStringLiteral("chkDontPrompt"))->setChecked(true);
+            confirm->cmdSuggestionOk_Click();
+        });
         mainWindow->cmdNext_Click();
+        suggestions.move(0, 0);
+        suggestions.SSTab1_Click(1);
+        suggestions.lstSuggestions_ItemClick(1, 11);
+    });
+    tour.Then(1500, [&] {
+        Save(&mainWindow->Suggestions(), out + QStringLiteral("/suggestions-after-analysis.png"));
         mainWindow->Suggestions().close();
         mainWindow->move(0, 0);
     });
