@@ -1,7 +1,6 @@
 // Start-up of the desktop program.
 #include "common/ProgramFolder.h"
 #include "shell/AppStyle.h"
-#include "shell/SettingsIni.h"
 #include "shell/SplitterMessageBox.h"
 #include "shell/UiServices.h"
 #include "shell/frmMain.h"

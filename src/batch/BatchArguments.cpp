@@ -115,12 +115,6 @@ constexpr qulonglong kLatestEpochSecond = 253402300799;
 
 } // namespace
 
-const QStringList &CustomizationLevelNames()
-{
-    static const QStringList names{u"Maximum"_qs, u"Level 3"_qs, u"Level 2"_qs, u"Level 1"_qs, u"Minimum"_qs};
-    return names;
-}
-
 ParsedArguments ParseBatchArguments(const QStringList &arguments, const std::optional<QString> &sourceDateEpoch)
 {
     QCommandLineParser parser;

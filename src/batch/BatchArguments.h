@@ -1,5 +1,6 @@
 #pragma once
 
+#include "engine/SpinGenerator.h"
 #include "export/RssExport.h"
 #include "export/SqlExport.h"
 
@@ -56,9 +57,6 @@ struct ParsedArguments
     BatchArguments Arguments;
     QString Error; ///< what is wrong with the command line (UsageError)
 };
-
-/// The names of the customization levels in list order ("Maximum" .. "Minimum").
-const QStringList &CustomizationLevelNames();
 
 /// Reads the arguments (the first one is the program). `sourceDateEpoch` is the value of the
 /// environment variable SOURCE_DATE_EPOCH, or nothing when it is not set.

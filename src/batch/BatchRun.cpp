@@ -71,7 +71,7 @@ int RunBatch(const BatchArguments &arguments, BatchConsole &console)
     QObject thesaurusOwner;
     std::unique_ptr<HttpPageSource> page;
     if (arguments.Lookup) {
-        const ThesaurusHost host = StartThesaurusHost(ProgramPath(u"SETTINGS.INI"_qs), &thesaurusOwner);
+        const ThesaurusHost host = StartThesaurusHost(SettingsIniPath(), &thesaurusOwner);
         if (!host.Message.isEmpty())
             console.Error(host.Message);
         page = std::make_unique<HttpPageSource>();

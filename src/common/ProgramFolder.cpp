@@ -58,4 +58,9 @@ QString ProgramPath(const QString &relative)
     return ProgramFolder() + QLatin1Char('/') + relative;
 }
 
+QString SettingsIniPath()
+{
+    return ProgramPath(QStringLiteral("SETTINGS.INI"));
+}
+
 } // namespace verbloom

@@ -22,4 +22,7 @@ void InitProgramFolder(const QStringList &arguments);
 /// ProgramFolder() + "/" + relative.
 QString ProgramPath(const QString &relative);
 
+/// The program folder's SETTINGS.INI (read with ReadIniValue; values are taken whole).
+QString SettingsIniPath();
+
 } // namespace verbloom

@@ -141,6 +141,12 @@ QString CachedWordFileAlternatives::Alternatives(const QString &token)
     return it.value();
 }
 
+const QStringList &CustomizationLevelNames()
+{
+    static const QStringList names{u"Maximum"_qs, u"Level 3"_qs, u"Level 2"_qs, u"Level 1"_qs, u"Minimum"_qs};
+    return names;
+}
+
 QString ReplaceWord(const QString &token, const QString &alternatives, const SpinSettings &settings,
                     RandomSource &random)
 {

@@ -13,11 +13,16 @@ namespace verbloom {
 
 class WordStore;
 
+/// The customization levels by index: "Maximum", "Level 3", "Level 2" (the default), "Level 1",
+/// "Minimum".
+const QStringList &CustomizationLevelNames();
+inline constexpr int DefaultCustomizationLevel = 2;
+
 /// Settings the spin reads at the moment of the call.
 struct SpinSettings
 {
     WordTestSettings WordTest;
-    int CustomizationLevel = 2; ///< index of cmbCustomizationLevel: 0 "Maximum" .. 4 "Minimum"
+    int CustomizationLevel = DefaultCustomizationLevel; ///< index of cmbCustomizationLevel: 0 "Maximum" .. 4 "Minimum"
 };
 
 /// Where the spin reads a word's alternatives.

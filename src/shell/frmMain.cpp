@@ -3,7 +3,6 @@
 
 #include "BrowserPageSource.h"
 #include "ImageCommand.h"
-#include "SettingsIni.h"
 #include "common/IniFile.h"
 #include "UiServices.h"
 #include "WebEngineBrowser.h"
@@ -409,8 +408,8 @@ void frmMain::Form_Load()
     BringPageToFront(1);
     m_panels->setCurrentWidget(Picture1);
 
-    cmbCustomizationLevel->addItems({u"Maximum"_qs, u"Level 3"_qs, u"Level 2"_qs, u"Level 1"_qs, u"Minimum"_qs});
-    cmbCustomizationLevel->setCurrentIndex(2);
+    cmbCustomizationLevel->addItems(CustomizationLevelNames());
+    cmbCustomizationLevel->setCurrentIndex(DefaultCustomizationLevel);
     cmbIgnoreWords->addItems({u"2 Letters"_qs, u"3 Letters"_qs, u"4 Letters"_qs, u"5 Letters"_qs});
     cmbIgnoreWords->setCurrentIndex(1);
     lstIgnoreWords->setHeaderLabels({u"Ignored Words"_qs});

@@ -1,7 +1,7 @@
 #include "frmSplash.h"
 
-#include "SettingsIni.h"
 #include "common/IniFile.h"
+#include "common/ProgramFolder.h"
 #include "shell/ArticleModel.h"
 
 #include <QCoreApplication>
