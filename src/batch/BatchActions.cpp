@@ -98,12 +98,11 @@ std::optional<QString> BatchActions::CheckRss() const
     const RssExportOptions &options = m_arguments.Rss;
     if (const std::optional<UserMessage> failure = ValidateXmlForm(options, m_decimalPoint))
         return failure->Text;
+    const RssItemCount count = ReadRssItemCount(options, m_decimalPoint);
+    if (count.Refusal)
+        return count.Refusal->Text;
     // The window does nothing for a count of 0 or less; a batch run says so.
-    const double count = ParseNumber(options.Count.trimmed(), m_decimalPoint).value_or(0.0);
-    const std::optional<qint16> records = ToInt16(count);
-    if (!records && count > 0)
-        return u"No of record should not be more than 32767"_qs;
-    if (!records || *records <= 0)
+    if (count.Items <= 0)
         return u"No of record should be between 1 and 32767"_qs;
     const QString path = options.FileName.trimmed();
     if (path.isEmpty())
@@ -135,12 +134,8 @@ std::optional<QString> BatchActions::CheckSite()
     const SiteGenerationCheck check = CheckSiteGeneration(m_site, m_decimalPoint);
     if (!check.Valid)
         return check.Messages.first().Text;
-    bool tooLong = false;
-    CleanFileName(m_site.NavigationLinkName, m_site.ReplaceChar, &tooLong);
-    if (tooLong) {
-        return u"The navigation link name grows too long when its characters are replaced by \""_qs
-            + m_site.ReplaceChar + QLatin1Char('"');
-    }
+    if (const std::optional<UserMessage> refusal = CheckNavigationLinkName(m_site))
+        return refusal->Text;
     // The window asks whether to go on; a batch run goes on only when told to.
     if (!check.Messages.isEmpty() && !m_arguments.Force) {
         return u"File already exist: %1/index.%2 (add --force to write the site over it)"_qs.arg(

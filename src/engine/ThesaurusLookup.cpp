@@ -48,7 +48,10 @@ QString ContextSentence(const ArticleTokens &article, int list, qsizetype row)
 QString FetchAlternatives(const QString &word, const QString &suffix, int list, qsizetype row,
                           const LookupContext &context)
 {
-    if (StopProcessing || !context.Page || context.Host.isEmpty())
+    // No thesaurus has entries this long; looking such a token up (and retrying it once per
+    // trailing "s") would only keep the analysis waiting.
+    constexpr qsizetype kMaxLookupLength = 64;
+    if (StopProcessing || !context.Page || context.Host.isEmpty() || word.size() > kMaxLookupLength)
         return {};
 
     PageSource &page = *context.Page;

@@ -116,6 +116,18 @@ QString RssItem(const QString &title, const QString &url, const QString &descrip
         + QStringLiteral("</pubDate>\r\n      </item>\r\n");
 }
 
+RssItemCount ReadRssItemCount(const RssExportOptions &options, QChar decimalPoint)
+{
+    const double value = ParseNumber(options.Count.trimmed(), decimalPoint).value_or(0.0);
+    const std::optional<qint16> count = ToInt16(value);
+    RssItemCount result;
+    if (!count && value > 0)
+        result.Refusal = InformationMessage(QStringLiteral("No of record should not be more than 32767"));
+    else
+        result.Items = count.value_or(0);
+    return result;
+}
+
 ExportResult ExportRss(const RssExportOptions &options, ArticleBoxes &boxes, VersionSource &source,
                        const Clock &clock, QChar decimalPoint)
 {
@@ -126,11 +138,10 @@ ExportResult ExportRss(const RssExportOptions &options, ArticleBoxes &boxes, Ver
         result.Messages.append(*failure);
         return result;
     }
-    const double countValue = ParseNumber(options.Count.trimmed(), decimalPoint).value_or(0.0);
-    const std::optional<qint16> count = ToInt16(countValue);
-    if (!count && countValue > 0)
-        return Refused(path, QStringLiteral("No of record should not be more than 32767"));
-    if (!count || *count <= 0) {
+    const RssItemCount count = ReadRssItemCount(options, decimalPoint);
+    if (count.Refusal)
+        return Refused(path, count.Refusal->Text);
+    if (count.Items <= 0) {
         ExportResult result;
         result.FileName = path;
         result.Outcome = ExportResult::Status::NothingToDo;
@@ -156,7 +167,7 @@ ExportResult ExportRss(const RssExportOptions &options, ArticleBoxes &boxes, Ver
     bool spoolOk = true;
     // An iteration whose title or contents is empty does nothing, the boxes included, so every
     // later one does nothing either.
-    for (qsizetype k = 1; k <= *count; ++k) {
+    for (qsizetype k = 1; k <= count.Items; ++k) {
         if (boxes.Title.isEmpty() || boxes.Contents.isEmpty())
             break;
         spoolOk = spoolOk && rows.Append(boxes.Title, RssDescription(boxes.Contents, limit));

@@ -46,6 +46,15 @@ QString RssDate(const QDateTime &when);
 QString RssItem(const QString &title, const QString &url, const QString &description,
                 const QDateTime &when);
 
+/// The number of items of a form that passed ValidateXmlForm: 0 or less means nothing to do; a
+/// number above 32767 is refused with "No of record should not be more than 32767".
+struct RssItemCount
+{
+    qint16 Items = 0;
+    std::optional<UserMessage> Refusal;
+};
+RssItemCount ReadRssItemCount(const RssExportOptions &options, QChar decimalPoint = QLatin1Char('.'));
+
 /// cmdSave_Click without the window. XmlFileName is the trimmed file name; then ValidateXmlForm;
 /// a count of 0 or less does nothing (NothingToDo, no message); a count above 32767 and a
 /// file name of blanks are refused. FillArticleList then makes count rows, the first from the

@@ -2,8 +2,6 @@
 
 #include <QString>
 
-#include <functional>
-
 namespace verbloom {
 
 /// The main window's article boxes txtTitle and txtArticle. An export or site run takes its first
@@ -22,19 +20,6 @@ public:
     virtual ~VersionSource() = default;
     virtual QString NextTitle() = 0;
     virtual QString NextContents() = 0;
-};
-
-/// A version source made of two functions.
-class FunctionVersionSource final : public VersionSource
-{
-public:
-    FunctionVersionSource(std::function<QString()> nextTitle, std::function<QString()> nextContents);
-    QString NextTitle() override;
-    QString NextContents() override;
-
-private:
-    std::function<QString()> m_nextTitle;
-    std::function<QString()> m_nextContents;
 };
 
 /// Puts the next version into the boxes: a new title first, then a new contents.

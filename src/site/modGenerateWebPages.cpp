@@ -1,11 +1,11 @@
 #include "site/modGenerateWebPages.h"
 
 #include "common/Numbers.h"
+#include "common/TextFile.h"
 #include "export/VersionSpool.h"
 #include "site/TemplateFiles.h"
 
 #include <QFileInfo>
-#include <QSaveFile>
 
 namespace verbloom {
 
@@ -21,9 +21,7 @@ constexpr qsizetype kMaxListedFailures = 10;
 
 bool WritePage(const QString &path, const QString &text, SiteRunResult &result)
 {
-    QSaveFile file(path);
-    const QByteArray bytes = text.toUtf8();
-    const bool ok = file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size() && file.commit();
+    const bool ok = WriteTextFile(path, text);
     if (ok)
         ++result.FilesWritten;
     else
@@ -159,6 +157,19 @@ UserMessage WebPagesQuestion(const SiteOptions &options)
                        UserMessage::Icon::Information, UserMessage::Buttons::OkCancel};
 }
 
+std::optional<UserMessage> CheckNavigationLinkName(const SiteOptions &options, QString *caption)
+{
+    bool tooLong = false;
+    const QString cleaned = CleanFileName(options.NavigationLinkName, options.ReplaceChar, &tooLong);
+    if (caption)
+        *caption = cleaned;
+    if (!tooLong)
+        return std::nullopt;
+    return InformationMessage(QStringLiteral("The navigation link name grows too long when its characters are "
+                                             "replaced by \"")
+                              + options.ReplaceChar + QLatin1Char('"'));
+}
+
 SiteRunResult GenerateWebSite(const QString &programFolder, const SiteOptions &options, ArticleBoxes &boxes,
                               VersionSource &source, QChar decimalPoint)
 {
@@ -166,13 +177,9 @@ SiteRunResult GenerateWebSite(const QString &programFolder, const SiteOptions &o
     const std::optional<qint16> pages = TextToInt16(options.NoOfPages, decimalPoint);
     if (!pages)
         return Refusal(QStringLiteral("Number of pages to generate should be between 0 and 32767"));
-    bool tooLong = false;
-    QString caption = CleanFileName(options.NavigationLinkName, options.ReplaceChar, &tooLong);
-    if (tooLong) {
-        return Refusal(QStringLiteral("The navigation link name grows too long when its characters are "
-                                      "replaced by \"")
-                       + options.ReplaceChar + QLatin1Char('"'));
-    }
+    QString caption;
+    if (const std::optional<UserMessage> refusal = CheckNavigationLinkName(options, &caption))
+        return Refusal(refusal->Text);
 
     SiteRunResult result;
     const QString folder = options.OutputFolder + QLatin1Char('/');

@@ -8,6 +8,8 @@
 #include <QString>
 #include <QStringList>
 
+#include <optional>
+
 namespace verbloom {
 
 /// CleanFileName: replaces, in 28 steps in this order, every blank, "'", ",", "&", "~", "!", "@",
@@ -16,6 +18,10 @@ namespace verbloom {
 /// A replacement that would make the text longer than 65536 characters stops the cleaning
 /// there and sets *tooLong.
 QString CleanFileName(const QString &text, const QString &replacement, bool *tooLong = nullptr);
+
+/// Refuses a navigation link name that cleaning would grow beyond what a page can hold; gives the
+/// cleaned caption through `caption` when asked.
+std::optional<UserMessage> CheckNavigationLinkName(const SiteOptions &options, QString *caption = nullptr);
 
 /// Every CR LF, then every remaining LF, as "<br>".
 QString LineBreaksToHtml(const QString &text);

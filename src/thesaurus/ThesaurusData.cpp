@@ -77,11 +77,6 @@ bool ThesaurusData::Open(const QString &pathWithoutExtension, QString *error)
     return true;
 }
 
-bool ThesaurusData::IsOpen() const
-{
-    return m_thes != nullptr;
-}
-
 QList<ThesaurusMeaning> ThesaurusData::Lookup(const QString &word)
 {
     QList<ThesaurusMeaning> meanings;

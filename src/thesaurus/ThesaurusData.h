@@ -29,7 +29,6 @@ public:
 
     /// Opens PATH.idx and PATH.dat; false with a message in `error` when either cannot be read.
     bool Open(const QString &pathWithoutExtension, QString *error = nullptr);
-    bool IsOpen() const;
 
     /// The meanings of the word, looked up in lower case, in the order of the data file.
     /// Meanings left without synonyms are dropped. Empty for an unknown word.

@@ -159,6 +159,10 @@ void TestThesaurus::lookup_data()
     // Cancel during the wait: the loaded page is still read, but nothing is offered or retried.
     QTest::newRow("stop in wait")
         << u"quick"_qs << false << 0 << 1 << u"stop in wait"_qs << u"core, heart"_qs << u"quick"_qs << QString();
+    QTest::newRow("64 characters are looked up")
+        << QString(64, u'x') << true << 0 << 1 << QString() << QString() << QString(64, u'x') << QString();
+    QTest::newRow("65 characters are not") << QString(64, u'x') + u's' << true << 0 << 1 << QString() << QString()
+                                           << QString() << QString();
     QTest::newRow("stop in wait, no retry")
         << u"Walked"_qs << true << 1 << 3 << u"stop in wait"_qs << QString() << u"Walked"_qs << QString();
 }
