@@ -114,6 +114,11 @@ std::optional<QString> WordLists::FindRepeat(const QString &word) const
     return m_rows[it->first].at(it->second).Alternatives;
 }
 
+QString TotalCaption(qsizetype rows)
+{
+    return QLatin1String("Working with ") + QString::number(rows) + QLatin1String(" Words");
+}
+
 void AddItems(WordLists &lists, const QString &word, int list, const WordTestSettings &settings,
               const WordStore &store, const AddItemsHooks &hooks)
 {
@@ -146,8 +151,7 @@ void AddItems(WordLists &lists, const QString &word, int list, const WordTestSet
     }
 
     if (hooks.SetTotal)
-        hooks.SetTotal(QLatin1String("Working with ") + QString::number(lists.Count(list))
-                       + QLatin1String(" Words"));
+        hooks.SetTotal(TotalCaption(lists.Count(list)));
 }
 
 qsizetype SaveData(const WordLists &lists, const WordTestSettings &settings, const WordStore &store)

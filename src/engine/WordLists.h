@@ -59,6 +59,9 @@ private:
     QHash<QString, std::pair<int, qsizetype>> m_lastByFoldedText;
 };
 
+/// The caption of the row count under the lists: "Working with N Words".
+QString TotalCaption(qsizetype rows);
+
 /// What the suggestions window lends AddItems.
 struct AddItemsHooks
 {

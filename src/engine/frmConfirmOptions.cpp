@@ -17,14 +17,6 @@
 
 namespace verbloom {
 
-namespace {
-
-constexpr int TwipsPerPixel = 15;
-const QString NormalSkin = QStringLiteral("pic1");
-const QString HoverSkin = QStringLiteral("pic2");
-
-} // namespace
-
 frmConfirmOptions::frmConfirmOptions(frmSuggestions &suggestions, QWidget *parent)
     : QDialog(parent)
     , m_suggestions(suggestions)
@@ -82,9 +74,9 @@ frmConfirmOptions::frmConfirmOptions(frmSuggestions &suggestions, QWidget *paren
     chkSuggestionDoNotPrompt->setObjectName(QStringLiteral("chkSuggestionDoNotPrompt"));
 
     cmdSuggestionOk = new ImageCommand(QStringLiteral("lblSuggestionOk"), QStringLiteral("cmdSuggestionOk"),
-                                       QStringLiteral("Save Selected"), NormalSkin, pctOptions);
+                                       QStringLiteral("Save Selected"), PicSkin, pctOptions);
     cmdIgnore = new ImageCommand(QStringLiteral("lblIgnore"), QStringLiteral("cmdIgnore"),
-                                 QStringLiteral("Ignore Word"), NormalSkin, pctOptions);
+                                 QStringLiteral("Ignore Word"), PicSkin, pctOptions);
 
     lblList = new QLabel(QStringLiteral("0"), pctOptions);
     lblList->setObjectName(QStringLiteral("lblList"));
@@ -112,11 +104,8 @@ frmConfirmOptions::frmConfirmOptions(frmSuggestions &suggestions, QWidget *paren
     connect(cmdIgnore, &ImageCommand::clicked, this, &frmConfirmOptions::cmdIgnore_Click);
     connect(chkSuggestionDoNotPrompt, &QCheckBox::clicked, this,
             &frmConfirmOptions::chkSuggestionDoNotPrompt_Click);
-    for (ImageCommand *command : {cmdSuggestionOk, cmdIgnore}) {
-        const auto highlight = [command] { command->SetSkin(HoverSkin); };
-        connect(command, &ImageCommand::mouseMovedOverLabel, this, highlight);
-        connect(command, &ImageCommand::mouseMovedOverImage, this, highlight);
-    }
+    for (ImageCommand *command : {cmdSuggestionOk, cmdIgnore})
+        command->SetHoverSkin(PicHoverSkin);
 
     // Meanings are ticked with the mouse; the keyboard starts in the custom meaning.
     txtCustom->setFocus();
@@ -194,8 +183,8 @@ bool frmConfirmOptions::eventFilter(QObject *watched, QEvent *event)
 
 void frmConfirmOptions::ResetSkins()
 {
-    cmdSuggestionOk->SetSkin(NormalSkin);
-    cmdIgnore->SetSkin(NormalSkin);
+    cmdSuggestionOk->SetSkin(PicSkin);
+    cmdIgnore->SetSkin(PicSkin);
 }
 
 } // namespace verbloom

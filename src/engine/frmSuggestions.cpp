@@ -2,7 +2,7 @@
 
 #include "engine/SpinGenerator.h"
 #include "engine/SuggestionsHost.h"
-#include "engine/WordListModel.h"
+#include "engine/frmSuggestionsModel.h"
 #include "engine/frmConfirmOptions.h"
 #include "common/ProgramFolder.h"
 #include "shell/ImageCommand.h"
@@ -27,23 +27,13 @@
 
 #include <algorithm>
 #include <limits>
-#include <optional>
 
 namespace verbloom {
 
 namespace {
 
-constexpr int TwipsPerPixel = 15;
 // While the lists fill, pending events are let through at least this often.
 constexpr qint64 EventIntervalMs = 12;
-
-const QString NormalSkin = QStringLiteral("pic1");
-const QString HoverSkin = QStringLiteral("pic2");
-
-QString TotalCaption(qsizetype rows)
-{
-    return QStringLiteral("Working with ") + QString::number(rows) + QStringLiteral(" Words");
-}
 
 int ClampToInt(qsizetype value)
 {
@@ -165,7 +155,7 @@ void frmSuggestions::BuildWindow()
     chkDontPrompt = new QCheckBox(QStringLiteral("Manual"), Picture1);
     chkDontPrompt->setObjectName(QStringLiteral("chkDontPrompt"));
     lblOpenSite = new ImageCommand(QStringLiteral("lblOpenSite"), QStringLiteral("imglblOpenSite"),
-                                   QStringLiteral("Get Suggenstion"), NormalSkin, Picture1);
+                                   QStringLiteral("Get Suggenstion"), PicSkin, Picture1);
     FitCaption(lblOpenSite);
     auto *sampleCaption = Caption(
         QStringLiteral("This is a sample content. Click on the list on the left to generate again."), Picture1,
@@ -212,9 +202,9 @@ void frmSuggestions::BuildWindow()
     pctStatus->hide();
 
     cmdOk = new ImageCommand(QStringLiteral("cmdOk"), QStringLiteral("imgCmdOk"), QStringLiteral("Ok"),
-                             NormalSkin, Picture1);
+                             PicSkin, Picture1);
     cmdCancel = new ImageCommand(QStringLiteral("cmdCancel"), QStringLiteral("imgcmdCancel"),
-                                 QStringLiteral("Cancel"), NormalSkin, Picture1);
+                                 QStringLiteral("Cancel"), PicSkin, Picture1);
     auto *commands = new QHBoxLayout;
     commands->setSpacing(10);
     commands->addStretch(1);
@@ -244,11 +234,8 @@ void frmSuggestions::BuildWindow()
     connect(lblOpenSite, &ImageCommand::clicked, this, &frmSuggestions::lblOpenSite_Click);
     connect(cmdOk, &ImageCommand::clicked, this, &frmSuggestions::cmdOk_Click);
     connect(cmdCancel, &ImageCommand::clicked, this, &frmSuggestions::cmdCancel_Click);
-    for (ImageCommand *command : {lblOpenSite, cmdOk, cmdCancel}) {
-        const auto highlight = [command] { command->SetSkin(HoverSkin); };
-        connect(command, &ImageCommand::mouseMovedOverLabel, this, highlight);
-        connect(command, &ImageCommand::mouseMovedOverImage, this, highlight);
-    }
+    for (ImageCommand *command : {lblOpenSite, cmdOk, cmdCancel})
+        command->SetHoverSkin(PicHoverSkin);
 
     setMinimumSize(760, 500);
     resize(960, 640);
@@ -349,17 +336,11 @@ void frmSuggestions::SelectContentsTab()
 
 void frmSuggestions::AddItems(const QString &word, int list)
 {
-    // "Manual" as it stood when the lookup began: ticking "Do not prompt again." in the confirm
-    // window keeps the meanings chosen there instead of storing the last meaning over them.
-    std::optional<bool> manualAtLookup;
     AddItemsHooks hooks;
     hooks.SetCaption = [this](const QString &caption) { setWindowTitle(caption); };
     hooks.ProcessEvents = [this] { ProcessPendingEvents(); };
-    hooks.Manual = [this, &manualAtLookup] { return manualAtLookup.value_or(chkDontPrompt->isChecked()); };
-    hooks.Lookup = [this, &manualAtLookup](const QString &w, int l, qsizetype row) {
-        manualAtLookup = chkDontPrompt->isChecked();
-        return Lookup(w, l, row);
-    };
+    hooks.Manual = [this] { return chkDontPrompt->isChecked(); };
+    hooks.Lookup = [this](const QString &w, int l, qsizetype row) { return Lookup(w, l, row); };
     hooks.SetTotal = [this](const QString &text) { lblTotal->setText(text); };
     verbloom::AddItems(m_lists, word, list, m_host.CurrentWordTestSettings(), m_store, hooks);
 }
@@ -396,11 +377,8 @@ void frmSuggestions::PopulateContent()
 {
     SaveData();
     WordFileAlternatives source(m_store);
-    const ArticleTokens &article = CurrentArticle();
-    const SpinSettings settings = m_host.CurrentSpinSettings();
-    QString sample = SSTab1->currentIndex() == 0
-        ? SpinTitle(article.TitleTokens, settings, source, ProcessRandom())
-        : SpinContents(article.ContentsTokens, settings, source, ProcessRandom());
+    Spinner spinner(CurrentArticle(), m_host.CurrentSpinSettings(), source, ProcessRandom());
+    QString sample = SSTab1->currentIndex() == 0 ? spinner.SpinTitle() : spinner.SpinContents();
     sample.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
     txtSample->setPlainText(sample);
 }
@@ -513,12 +491,7 @@ void frmSuggestions::cmdCancel_Click()
     if (m_host.AnalysisRunning())
         return; // the analysis takes the way back at its next contents token
     // No analysis is running to take the way back, so it is taken here.
-    SetStatusVisible(false);
-    Unload();
-    m_host.cmdNext_Click();
-    m_host.SetButton(false);
-    m_host.UnloadWaitWindow();
-    m_host.ShowMainWindow();
+    TakeWayBack(*this, m_host);
 }
 
 void frmSuggestions::CloseWindow()
@@ -589,9 +562,9 @@ void frmSuggestions::ProcessPendingEvents()
 
 void frmSuggestions::ResetSkins()
 {
-    lblOpenSite->SetSkin(NormalSkin);
-    cmdOk->SetSkin(NormalSkin);
-    cmdCancel->SetSkin(NormalSkin);
+    lblOpenSite->SetSkin(PicSkin);
+    cmdOk->SetSkin(PicSkin);
+    cmdCancel->SetSkin(PicSkin);
 }
 
 bool frmSuggestions::eventFilter(QObject *watched, QEvent *event)

@@ -124,6 +124,16 @@ ArticleTokens &CurrentArticle()
     return article;
 }
 
+void TakeWayBack(SuggestionsView &view, WizardHost &host)
+{
+    view.SetStatusVisible(false);
+    view.Unload();
+    host.cmdNext_Click();
+    host.SetButton(false);
+    host.UnloadWaitWindow();
+    host.ShowMainWindow();
+}
+
 bool FillWordLists(const QString &title, const QString &contents, ArticleTokens &model,
                    SuggestionsView &view, WizardHost &host)
 {
@@ -146,22 +156,13 @@ bool FillWordLists(const QString &title, const QString &contents, ArticleTokens 
         view.AddItems(titleTokens.at(i), 0);
     }
 
-    // The way back after Cancel: the wizard returns to its entry state.
-    const auto cancel = [&view, &host] {
-        view.SetStatusVisible(false);
-        view.Unload();
-        host.cmdNext_Click();
-        host.SetButton(false);
-        host.UnloadWaitWindow();
-        host.ShowMainWindow();
-        return false;
-    };
-
     const qsizetype m = contentsTokens.size() - 1;
     view.SetProgressMaximum(std::max<qsizetype>(m, 0));
     for (qsizetype i = 0; i <= m; ++i) {
-        if (StopProcessing)
-            return cancel();
+        if (StopProcessing) {
+            TakeWayBack(view, host);
+            return false;
+        }
         view.SelectContentsTab();
         view.ShowModeless();
         view.SetProgressValue(i);
@@ -169,8 +170,10 @@ bool FillWordLists(const QString &title, const QString &contents, ArticleTokens 
         view.AddItems(contentsTokens.at(i), 1);
     }
     // A Cancel during the last token has hidden the main window too: take the way back.
-    if (StopProcessing)
-        return cancel();
+    if (StopProcessing) {
+        TakeWayBack(view, host);
+        return false;
+    }
 
     view.SetWordCaption(kEnterAlternatesCaption.toString());
     view.SetStatusVisible(false);

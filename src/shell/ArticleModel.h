@@ -65,6 +65,10 @@ public:
     virtual void ShowMainWindow() = 0;
 };
 
+/// The way back after Cancel: the progress panel hides, the suggestions window unloads and the
+/// wizard returns to its entry state with the main window shown.
+void TakeWayBack(SuggestionsView &view, WizardHost &host);
+
 /// Caption of lblWord when every token has been handed on.
 inline constexpr QStringView kEnterAlternatesCaption = u"Please enter alternate words.";
 

@@ -36,8 +36,7 @@ protected:
 ImageList LoadSkins()
 {
     ImageList list;
-    for (const QString &key : {QStringLiteral("button_blue"), QStringLiteral("button_blue_hover"),
-                               QStringLiteral("pic1"), QStringLiteral("pic2")})
+    for (const QString &key : {BlueSkin, BlueHoverSkin, PicSkin, PicHoverSkin})
         list.Add(key, QPixmap(QStringLiteral(":/skins/") + key + QStringLiteral(".png")));
     return list;
 }
@@ -120,6 +119,8 @@ bool ImageCommand::eventFilter(QObject *watched, QEvent *event)
     switch (event->type()) {
     case QEvent::MouseMove:
         if (part->isEnabled()) {
+            if (!m_hoverSkin.isEmpty())
+                SetSkin(m_hoverSkin);
             if (watched == m_label)
                 emit mouseMovedOverLabel();
             else

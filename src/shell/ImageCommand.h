@@ -9,6 +9,15 @@ class QLabel;
 
 namespace verbloom {
 
+/// Twips of the original window layouts per pixel.
+inline constexpr int TwipsPerPixel = 15;
+
+/// Skin keys: the main window's commands, and the commands of the other windows.
+inline const QString BlueSkin = QStringLiteral("button_blue");
+inline const QString BlueHoverSkin = QStringLiteral("button_blue_hover");
+inline const QString PicSkin = QStringLiteral("pic1");
+inline const QString PicHoverSkin = QStringLiteral("pic2");
+
 /// Pictures by key, like an image list ("button_blue", "button_blue_hover", "pic1", "pic2").
 class ImageList final
 {
@@ -39,6 +48,9 @@ public:
     /// Takes the picture stored under the key; remembered so tests can read it back.
     void SetSkin(const QString &key);
     QString Skin() const { return m_skin; }
+    /// The skin a mouse move over the caption or the image takes while that part is enabled;
+    /// the window resets it. Without one, only the mouseMovedOver signals are emitted.
+    void SetHoverSkin(const QString &key) { m_hoverSkin = key; }
 
     void SetCaption(const QString &caption);
     /// The same tool tip on the caption and the image.
@@ -57,6 +69,7 @@ private:
     QLabel *m_image = nullptr;
     QLabel *m_label = nullptr;
     QString m_skin;
+    QString m_hoverSkin;
 };
 
 } // namespace verbloom

@@ -145,7 +145,7 @@ QString ScriptedUiServices::GetExistingDirectory(QWidget *, const QString &, con
 bool ScriptedUiServices::OpenWithShell(const QString &pathOrUrl)
 {
     Opened.append(pathOrUrl);
-    return true;
+    return OpenSucceeds;
 }
 
 } // namespace verbloom

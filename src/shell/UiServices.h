@@ -74,6 +74,7 @@ public:
     QList<Answer> NextAnswers;
     QStringList NextFileNames;
     QStringList NextDirectories;
+    bool OpenSucceeds = true; ///< what OpenWithShell answers
 
     Answer ShowMessage(QWidget *parent, const Message &message) override;
     QString GetOpenFileName(QWidget *parent, const FileDialog &dialog) override;

@@ -40,15 +40,12 @@ namespace verbloom {
 
 namespace {
 
-constexpr int TwipsPerPixel = 15;
 constexpr int BannerHeight = 1695 / TwipsPerPixel;
 constexpr int ButtonBarWidth = 2355 / TwipsPerPixel;
 constexpr int IgnoredWordsColumnWidth = 3000 / TwipsPerPixel;
 // Room between the verify page and the row of the wizard button below it.
 constexpr int VerifyPageGap = 8;
 
-const QString NormalSkin = QStringLiteral("button_blue");
-const QString HoverSkin = QStringLiteral("button_blue_hover");
 const QString TextFileFilter = QStringLiteral("*.txt Text Files (*.txt);;*.* All Files (*)");
 const QString CrLf = QStringLiteral("\r\n");
 
@@ -102,14 +99,17 @@ ImageCommand *frmMain::AddCommand(const QString &labelName, const QString &image
                                   const QString &caption, QWidget *parent, void (frmMain::*handler)(),
                                   bool labelHighlights)
 {
-    auto *command = new ImageCommand(labelName, imageName, caption, NormalSkin, parent);
+    auto *command = new ImageCommand(labelName, imageName, caption, BlueSkin, parent);
     connect(command, &ImageCommand::clicked, this, handler);
-    connect(command, &ImageCommand::mouseMovedOverImage, this, [command] { command->SetSkin(HoverSkin); });
-    if (labelHighlights)
-        connect(command, &ImageCommand::mouseMovedOverLabel, this, [command] { command->SetSkin(HoverSkin); });
-    else
+    if (labelHighlights) {
+        command->SetHoverSkin(BlueHoverSkin);
+    } else {
+        // Only the image highlights; a move over the caption just clears its frame.
+        connect(command, &ImageCommand::mouseMovedOverImage, this,
+                [command] { command->SetSkin(BlueHoverSkin); });
         connect(command, &ImageCommand::mouseMovedOverLabel, this,
                 [command] { command->Label()->setFrameShape(QFrame::NoFrame); });
+    }
     return command;
 }
 
@@ -231,7 +231,7 @@ QWidget *frmMain::BuildButtonBar()
                          &frmMain::cmdSave_Click);
 
     // A click on the XML image shows its highlighted skin.
-    connect(lblSaveAsxml, &ImageCommand::clicked, this, [this] { lblSaveAsxml->SetSkin(HoverSkin); });
+    connect(lblSaveAsxml, &ImageCommand::clicked, this, [this] { lblSaveAsxml->SetSkin(BlueHoverSkin); });
 
     for (ImageCommand *command : {cmdArticle, cmdConfig, cmdVerifyTryAgain, lblSaveAsxml, lblSaveAsSQLfile,
                                   cmdHelp, cmdGenerateSite, cmdSave})
@@ -503,6 +503,10 @@ void frmMain::AppendBlankIfMissing(QPlainTextEdit *box)
 void frmMain::cmdNext_Click()
 {
     if (cmdNext->Caption() == NextCaption) {
+        // The suggestions window lets events through while it fills: a Next reached that way
+        // must not start a second analysis inside the running one.
+        if (m_analysisRunning)
+            return;
         if (!VerifyArticle())
             return;
         m_webData->SetSilent(true);
@@ -645,7 +649,9 @@ void frmMain::cmdSave_Click()
 
 void frmMain::cmdHelp_Click()
 {
-    m_ui.OpenWithShell(ProgramPath(u"Help/Verbloom_Help.htm"_qs));
+    const QString path = ProgramPath(u"Help/Verbloom_Help.htm"_qs);
+    if (!m_ui.OpenWithShell(path))
+        m_ui.Say(this, u"The help page could not be opened: "_qs + path, UiServices::Icon::Exclamation);
 }
 
 // The export and site windows open from these commands once they exist.
@@ -668,7 +674,12 @@ void frmMain::cmdBrowseTextFile_Click()
     const QString path = m_ui.GetOpenFileName(this, dialog);
     if (path.isEmpty())
         return;
-    txtArticle->setPlainText(ReadTextFile(path));
+    QString text;
+    if (!TryReadTextFile(path, text)) {
+        m_ui.Say(this, u"The file could not be read: "_qs + path, UiServices::Icon::Critical);
+        return;
+    }
+    txtArticle->setPlainText(text);
 }
 
 void frmMain::cmdIgnoreWordsAdd_Click()
@@ -727,7 +738,7 @@ void frmMain::Command1_Click()
 void frmMain::ResetSkins(std::initializer_list<ImageCommand *> commands)
 {
     for (ImageCommand *command : commands)
-        command->SetSkin(NormalSkin);
+        command->SetSkin(BlueSkin);
 }
 
 bool frmMain::eventFilter(QObject *watched, QEvent *event)

@@ -37,10 +37,9 @@ frmOpenURL::frmOpenURL(QLineEdit &title, QPlainTextEdit &contents, UiServices &u
         u"(Note:- Please make sure that the URL starts with \"http://\" or \"https://\" )"_qs, Picture1);
     note->setObjectName(u"lblNote"_qs);
     note->setWordWrap(true);
-    cmdGet = new ImageCommand(u"Label4"_qs, u"cmdGet"_qs, u"Get Contents"_qs, u"pic1"_qs, Picture1);
+    cmdGet = new ImageCommand(u"Label4"_qs, u"cmdGet"_qs, u"Get Contents"_qs, PicSkin, Picture1);
+    cmdGet->SetHoverSkin(PicHoverSkin);
     connect(cmdGet, &ImageCommand::clicked, this, &frmOpenURL::cmdGet_Click);
-    connect(cmdGet, &ImageCommand::mouseMovedOverLabel, this, [this] { cmdGet->SetSkin(u"pic2"_qs); });
-    connect(cmdGet, &ImageCommand::mouseMovedOverImage, this, [this] { cmdGet->SetSkin(u"pic2"_qs); });
     connect(txturl, &QLineEdit::returnPressed, this, &frmOpenURL::cmdGet_Click);
 
     auto *panelLayout = new QGridLayout(Picture1);
@@ -131,7 +130,7 @@ void frmOpenURL::WebBrowser1_DocumentComplete()
 bool frmOpenURL::eventFilter(QObject *watched, QEvent *event)
 {
     if (watched == Picture1 && event->type() == QEvent::MouseMove)
-        cmdGet->SetSkin(u"pic1"_qs);
+        cmdGet->SetSkin(PicSkin);
     return QDialog::eventFilter(watched, event);
 }
 

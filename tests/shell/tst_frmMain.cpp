@@ -56,6 +56,7 @@ private slots:
     void nextFillsListsThenVerify();
     void lookupThroughWebData();
     void cancelDuringAnalysis();
+    void nextIgnoredDuringAnalysis();
     void saveContents_data();
     void saveContents();
     void saveDialogReplacesWithoutAsking();
@@ -311,6 +312,50 @@ void tst_frmMain::cancelDuringAnalysis()
     QVERIFY(!rig.Main->AnalysisRunning());
 }
 
+void tst_frmMain::nextIgnoredDuringAnalysis()
+{
+    // Ok in the suggestions window shows the main window while the lists still fill; Go Back
+    // works there, but Next must not start a second analysis inside the running one.
+    MainRig rig(m_thesaurus.BaseUrl());
+    for (const QString &word : {u"long"_qs, u"article"_qs, u"alpha"_qs, u"bravo"_qs, u"charlie"_qs})
+        rig.WriteWordFile(word, u"one, two"_qs);
+    rig.EnterArticle(u"Long article"_qs, u"alpha bravo charlie. "_qs.repeated(1500));
+
+    bool done = false;
+    QString captionAfterGoBack, captionAfterNext;
+    int pageAfterNext = -1;
+    QTimer driver;
+    connect(&driver, &QTimer::timeout, this, [&] {
+        if (done || !rig.Main->AnalysisRunning() || rig.Main->Suggestions().Lists().Count(1) < 10)
+            return;
+        done = true;
+        QTest::mouseClick(rig.Main->Suggestions().findChild<QLabel *>(u"cmdOk"_qs), Qt::LeftButton);
+        rig.Click(u"cmdNext"_qs); // Go Back
+        captionAfterGoBack = rig.Command(u"cmdNext"_qs)->Caption();
+        rig.Click(u"cmdNext"_qs); // Next, ignored
+        captionAfterNext = rig.Command(u"cmdNext"_qs)->Caption();
+        pageAfterNext = rig.Main->CurrentPage();
+    });
+    driver.start(0);
+    rig.Click(u"cmdNext"_qs);
+    driver.stop();
+
+    QVERIFY(done);
+    QCOMPARE(captionAfterGoBack, frmMain::NextCaption);
+    QCOMPARE(captionAfterNext, frmMain::NextCaption);
+    QCOMPARE(pageAfterNext, 0);
+    QVERIFY(!rig.Main->AnalysisRunning());
+    QCOMPARE(rig.Main->CurrentPage(), 0);
+    QCOMPARE(rig.Command(u"cmdNext"_qs)->Caption(), frmMain::NextCaption);
+    QCOMPARE(rig.Main->Suggestions().Lists().Count(1), CurrentArticle().ContentsTokens.size());
+    QCOMPARE(rig.Text(u"txtTitle"_qs), u"Long article "_qs);
+
+    // Once the analysis is over, Next works again.
+    rig.Click(u"cmdNext"_qs);
+    QCOMPARE(rig.Main->CurrentPage(), 1);
+    QCOMPARE(rig.Command(u"cmdNext"_qs)->Caption(), frmMain::GoBackCaption);
+}
+
 void tst_frmMain::saveContents_data()
 {
     QTest::addColumn<QString>("contents");
@@ -392,21 +437,36 @@ void tst_frmMain::browseTextFile_data()
 {
     QTest::addColumn<QByteArray>("bytes");
     QTest::addColumn<bool>("cancel");
+    QTest::addColumn<QString>("file");      // chosen in the dialog; PATH is the file written
     QTest::addColumn<QString>("expected");
-    QTest::newRow("CR LF text") << QByteArray("Line 1\r\nLine 2") << false << u"Line 1\nLine 2"_qs;
-    QTest::newRow("Windows-1252") << QByteArray("Caf\xe9") << false << u"Caf\u00e9"_qs;
-    QTest::newRow("zero bytes") << QByteArray() << false << QString();
-    QTest::newRow("cancelled") << QByteArray("unused") << true << u"Typed contents"_qs;
+    QTest::addColumn<QStringList>("boxes"); // PATH stands for the chosen file
+    const QString typed = u"Typed contents"_qs;
+    const QString path = u"PATH"_qs;
+    QTest::newRow("CR LF text") << QByteArray("Line 1\r\nLine 2") << false << path << u"Line 1\nLine 2"_qs
+                                << QStringList();
+    QTest::newRow("Windows-1252") << QByteArray("Caf\xe9") << false << path << u"Caf\u00e9"_qs << QStringList();
+    QTest::newRow("zero bytes") << QByteArray() << false << path << QString() << QStringList();
+    QTest::newRow("cancelled") << QByteArray("unused") << true << path << typed << QStringList();
+    QTest::newRow("missing file: an error, the article kept")
+        << QByteArray("unused") << false << u"PATH.gone"_qs << typed
+        << QStringList{Box(u"The file could not be read: PATH"_qs, Buttons::Ok, Icon::Critical)};
+    QTest::newRow("a folder: an error, the article kept")
+        << QByteArray("unused") << false << u"PATH.d"_qs << typed
+        << QStringList{Box(u"The file could not be read: PATH"_qs, Buttons::Ok, Icon::Critical)};
 }
 
 void tst_frmMain::browseTextFile()
 {
     QFETCH(QByteArray, bytes);
     QFETCH(bool, cancel);
+    QFETCH(QString, file);
+    QFETCH(QStringList, boxes);
     MainRig rig(m_thesaurus.BaseUrl());
     rig.EnterArticle(u"Typed title"_qs, u"Typed contents"_qs);
-    const QString path = rig.Home.filePath(u"article.txt"_qs);
-    QVERIFY(WriteBinaryFile(path, bytes));
+    const QString written = rig.Home.filePath(u"article.txt"_qs);
+    QVERIFY(WriteBinaryFile(written, bytes));
+    QVERIFY(QDir(rig.Home.path()).mkdir(u"article.txt.d"_qs));
+    const QString path = QString(file).replace(u"PATH"_qs, written);
     if (!cancel)
         rig.Ui.NextFileNames = {path};
     rig.Click(u"imgBrowseFile"_qs);
@@ -415,13 +475,21 @@ void tst_frmMain::browseTextFile()
     QCOMPARE(rig.Ui.FileDialogs[0].Filter, TextFilter);
     QTEST(rig.Text(u"txtArticle"_qs), "expected");
     QCOMPARE(rig.Text(u"txtTitle"_qs), u"Typed title"_qs);
+    QCOMPARE(Boxes(rig.Ui), boxes.replaceInStrings(u"PATH"_qs, path));
 }
 
 void tst_frmMain::helpAndCommand1()
 {
     MainRig rig(m_thesaurus.BaseUrl());
+    const QString help = rig.Home.path() + u"/Help/Verbloom_Help.htm"_qs;
     rig.Click(u"imgHelp"_qs);
-    QCOMPARE(rig.Ui.Opened, QStringList{rig.Home.path() + u"/Help/Verbloom_Help.htm"_qs});
+    QCOMPARE(rig.Ui.Opened, QStringList{help});
+    QVERIFY(rig.Ui.Messages.isEmpty());
+    rig.Ui.OpenSucceeds = false;
+    rig.Click(u"imgHelp"_qs);
+    QCOMPARE(rig.Ui.Opened, (QStringList{help, help}));
+    QCOMPARE(Boxes(rig.Ui),
+             QStringList{Box(u"The help page could not be opened: "_qs + help, Buttons::Ok, Icon::Exclamation)});
 
     // The hidden command lists the known words without alternatives.
     rig.WriteWordFile(u"zeta"_qs, QString());

@@ -1,4 +1,4 @@
-#include "WordListModel.h"
+#include "frmSuggestionsModel.h"
 
 #include "WordLists.h"
 

@@ -11,6 +11,7 @@ class WordLists;
 /// One word list of the suggestions window as a table: "Alternate Word", "Suggestions" (the hidden
 /// alternatives) and "Similar Items". Blue rows get a blue fore colour, bold rows a bold font.
 /// Appended rows reach the view in batches: Flush() shows them at once, otherwise a short timer does.
+/// A part of the suggestions window (it uses QtGui types), built with the windows only.
 class WordListModel final : public QAbstractTableModel
 {
     Q_OBJECT
