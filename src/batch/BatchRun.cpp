@@ -1,9 +1,9 @@
 #include "batch/BatchRun.h"
-#include "common/LineEnds.h"
 
 #include "batch/BatchActions.h"
 #include "batch/BatchAnalysis.h"
 #include "batch/BatchConsole.h"
+#include "common/LineEnds.h"
 #include "common/ProgramFolder.h"
 #include "common/TextFile.h"
 #include "engine/RandomSource.h"

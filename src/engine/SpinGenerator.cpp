@@ -1,6 +1,6 @@
 #include "SpinGenerator.h"
-#include "common/LineEnds.h"
 
+#include "common/LineEnds.h"
 #include "common/Numbers.h"
 #include "engine/AlternativesList.h"
 #include "engine/WordStore.h"

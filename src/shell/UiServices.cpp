@@ -66,6 +66,20 @@ QString DefaultTitle(const QString &title)
 
 } // namespace
 
+UiServices::Answer UiServices::Show(QWidget *parent, const UserMessage &message)
+{
+    static constexpr Icon kIcons[] = {Icon::None, Icon::Information, Icon::Exclamation, Icon::Critical,
+                                      Icon::Question};
+    static constexpr Buttons kButtons[] = {Buttons::Ok, Buttons::OkCancel, Buttons::YesNo};
+    Message shown;
+    shown.Text = message.Text;
+    shown.Title = DefaultTitle(message.Title);
+    shown.IconKind = kIcons[static_cast<int>(message.IconKind)];
+    shown.ButtonSet = kButtons[static_cast<int>(message.ButtonSet)];
+    shown.DefaultButton = shown.ButtonSet == Buttons::YesNo ? Answer::Yes : Answer::Ok;
+    return ShowMessage(parent, shown);
+}
+
 UiServices::Answer UiServices::Say(QWidget *parent, const QString &text, Icon icon, Buttons buttons,
                                    const QString &title)
 {

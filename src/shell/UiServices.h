@@ -1,5 +1,7 @@
 #pragma once
 
+#include "export/UserMessage.h"
+
 #include <QList>
 #include <QString>
 #include <QStringList>
@@ -46,6 +48,9 @@ public:
     virtual QString GetExistingDirectory(QWidget *parent, const QString &title, const QString &start) = 0;
     /// Opens a file, folder or address with the user's default program; false when that failed.
     virtual bool OpenWithShell(const QString &pathOrUrl) = 0;
+
+    /// Shows a message the core handed back (default button: Ok, or Yes for a question).
+    Answer Show(QWidget *parent, const UserMessage &message);
 
     /// Shorthand for a message with the program's title "Verbloom" unless another is given.
     Answer Say(QWidget *parent, const QString &text, Icon icon = Icon::None,

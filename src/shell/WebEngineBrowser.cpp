@@ -1,4 +1,5 @@
 #include "WebEngineBrowser.h"
+
 #include "common/LineEnds.h"
 
 #include <QCoreApplication>

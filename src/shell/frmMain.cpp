@@ -1,20 +1,21 @@
 #include "frmMain.h"
-#include "common/LineEnds.h"
 
 #include "BrowserPageSource.h"
-#include "ImageCommand.h"
-#include "common/IniFile.h"
-#include "UiServices.h"
-#include "WebEngineBrowser.h"
 #include "frmOpenURL.h"
 #include "frmWait.h"
+#include "ImageCommand.h"
+#include "UiServices.h"
+#include "WebEngineBrowser.h"
 
+#include "common/IniFile.h"
+#include "common/LineEnds.h"
 #include "common/ProgramFolder.h"
 #include "common/TextFile.h"
 #include "engine/RandomSource.h"
 #include "engine/SpinGenerator.h"
 #include "engine/WordStore.h"
 #include "engine/frmSuggestions.h"
+#include "export/ExportResult.h"
 #include "shell/ArticleChecks.h"
 #include "shell/ArticleModel.h"
 
@@ -641,9 +642,7 @@ void frmMain::cmdSave_Click()
                  UiServices::Icon::Critical);
         return;
     }
-    if (m_ui.Say(this, u"File Saved as "_qs + path + CrLf + u"Do you want to open it?"_qs,
-                 UiServices::Icon::Information, UiServices::Buttons::YesNo)
-        == UiServices::Answer::Yes)
+    if (m_ui.Show(this, FileSavedQuestion(path)) == UiServices::Answer::Yes)
         m_ui.OpenWithShell(path);
 }
 
